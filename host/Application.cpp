@@ -1,0 +1,68 @@
+#include "host/Application.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "host/Dates.h"
+#include "host/libraries/Achievements.h"
+#include "host/libraries/ActivitySummaryCache.h"
+#include "host/screens/day/DayViewController.h"
+#include "platform/foundation/NSDate.h"
+
+namespace tavro {
+namespace {
+
+constexpr CGRect kScreen{0, 0, 390, 844};
+
+Ref<UIViewController> makeDay(const Application& application) {
+  const auto controller = makeController<DayViewController>();
+  controller->setDay(application.today());
+  return controller;
+}
+
+struct Screen {
+  std::string_view name;
+  Ref<UIViewController> (*make)(const Application&);
+};
+
+constexpr Screen kScreens[] = {{"day", &makeDay}};
+
+}  // namespace
+
+Application::Application(Diary diary)
+    : diary_(std::move(diary)), window_(makeView<UIWindow>(kScreen)) {
+  window_->makeKey();
+  setAddressBookFirstName(diary_.person.firstName);
+  const auto cache = ActivitySummaryCache::sharedInstance();
+  cache->removeAllSummaries();
+  for (const Day& day : diary_.days) {
+    cache->setSummary(day.date.number, summaryOf(day));
+  }
+}
+
+const Day* Application::today() const {
+  const auto found = std::ranges::find(diary_.days, dayOf(dateNow()), &Day::date);
+  return found == diary_.days.end() ? nullptr : &*found;
+}
+
+std::vector<std::string_view> Application::screenNames() {
+  std::vector<std::string_view> names;
+  std::ranges::transform(kScreens, std::back_inserter(names), &Screen::name);
+  return names;
+}
+
+Ref<UIViewController> Application::makeScreen(std::string_view name) const {
+  const auto* const screen = std::ranges::find(kScreens, name, &Screen::name);
+  return screen == std::end(kScreens) ? nullptr : screen->make(*this);
+}
+
+bool Application::showScreen(std::string_view name) {
+  const Ref<UIViewController> controller = makeScreen(name);
+  if (!controller) {
+    return false;
+  }
+  window_->setRootViewController(controller);
+  return true;
+}
+
+}  // namespace tavro

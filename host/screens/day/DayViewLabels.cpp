@@ -1,0 +1,33 @@
+#include "host/screens/day/DayViewLabels.h"
+
+namespace tavro {
+namespace {
+
+const Registered pairClass =
+    defineClass<DayViewTitleAndValueLabelPair, UIView>()
+        .method<&DayViewTitleAndValueLabelPair::titleLabel>("titleLabel")
+        .method<&DayViewTitleAndValueLabelPair::valueLabel>("valueLabel")
+        .method<&DayViewTitleAndValueLabelPair::layoutSubviews>("layoutSubviews");
+
+}  // namespace
+
+void DayViewTitleAndValueLabelPair::setTexts(std::string_view title, std::string_view value) {
+  if (!titleLabel_) {
+    titleLabel_ = makeLabel("");
+    valueLabel_ = makeLabel("");
+    addSubview(titleLabel_);
+    addSubview(valueLabel_);
+  }
+  titleLabel_->setText(string(title));
+  valueLabel_->setText(string(value));
+}
+
+void DayViewTitleAndValueLabelPair::layoutSubviews() {
+  if (titleLabel_) {
+    const double half = frame().size.width / 2;
+    titleLabel_->setFrame({0, 0, half, frame().size.height});
+    valueLabel_->setFrame({half, 0, half, frame().size.height});
+  }
+}
+
+}  // namespace tavro

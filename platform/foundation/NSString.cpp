@@ -1,0 +1,77 @@
+#include "platform/foundation/NSString.h"
+
+#include <unicode/unistr.h>
+
+#include "platform/foundation/IcuSupport.h"
+
+namespace tavro {
+namespace {
+
+constexpr std::u16string_view kNewlines = u"\n\v\f\r\u0085\u2028\u2029";
+
+}  // namespace
+
+std::string NSString::utf8() const {
+  std::string bytes;
+  borrowed(text_).toUTF8String(bytes);
+  return bytes;
+}
+
+Ref<NSString> string(std::u16string_view text) {
+  Ref<NSString> made = make<NSString>();
+  made->initWithText(std::u16string(text));
+  return made;
+}
+
+Ref<NSString> string(std::string_view utf8) { return stringOf(unicode(utf8)); }
+
+Ref<NSString> stringOf(const icu::UnicodeString& text) { return string(viewOf(text)); }
+
+std::string utf8(const id& string) {
+  const Ref<NSString> text = as<NSString>(string);
+  return text ? text->utf8() : std::string();
+}
+
+Ref<NSArray> componentsSeparatedByNewlines(const NSString& text) {
+  std::vector<id> pieces;
+  std::u16string_view rest = text.text();
+  while (true) {
+    const std::size_t end = rest.find_first_of(kNewlines);
+    pieces.push_back(string(rest.substr(0, end)));
+    if (end == std::u16string_view::npos) {
+      return arrayWithObjects(std::move(pieces));
+    }
+    rest.remove_prefix(end + 1);
+  }
+}
+
+bool containsString(const NSString& string, std::u16string_view part) {
+  return !part.empty() && string.text().find(part) != std::u16string_view::npos;
+}
+
+Ref<NSString> stringByReplacing(const NSString& text, std::u16string_view part,
+                                std::u16string_view replacement) {
+  std::u16string replaced;
+  std::u16string_view rest = text.text();
+  while (!part.empty()) {
+    const std::size_t found = rest.find(part);
+    if (found == std::u16string_view::npos) {
+      break;
+    }
+    replaced.append(rest.substr(0, found)).append(replacement);
+    rest.remove_prefix(found + part.size());
+  }
+  return string(replaced.append(rest));
+}
+
+namespace {
+
+id description(NSString* self) { return self; }
+
+const Registered kString =
+    defineClass<NSString, NSObject>().method<&NSString::length>("length").method<&description>(
+        "description");
+const Registered kPluralFormat = defineClass<NSPluralFormat, NSString>();
+
+}  // namespace
+}  // namespace tavro

@@ -1,0 +1,30 @@
+#include "platform/runtime/Message.h"
+
+namespace tavro::message {
+namespace {
+
+std::string nameOf(const Object* receiver, Name selector) {
+  const Class* const isa = receiver->isa();
+  return std::string(isa->isMetaclass() ? "+[" : "-[") + std::string(isa->name().text()) + " " +
+         std::string(selector.text()) + "]";
+}
+
+}  // namespace
+
+void raiseUnknownSelector(const Object* receiver, Name selector) {
+  raise(kInvalidArgumentException, nameOf(receiver, selector) + ": unrecognized selector");
+}
+
+void raiseWrongSignature(const Object* receiver, const Method& method, Signature called) {
+  raise(kInvalidArgumentException, nameOf(receiver, method.selector) + ": has the signature " +
+                                       std::string(method.signature.encodings) +
+                                       " and was called as " + std::string(called.encodings));
+}
+
+void raiseWrongClass(const Object* object, Name expected) {
+  raise(kInvalidArgumentException,
+        "an object of class " + std::string(object->isa()->name().text()) + " stands where " +
+            std::string(expected.text()) + " is needed");
+}
+
+}  // namespace tavro::message

@@ -1,0 +1,304 @@
+#include "platform/uikit/UIAccessibility.h"
+
+#include "platform/accessibility/Labels.h"
+#include "platform/foundation/Settings.h"
+#include "platform/uikit/UIView.h"
+
+namespace tavro {
+
+void AccessibilityAttributesDeleter::operator()(AccessibilityAttributes* attributes) const {
+  delete attributes;
+}
+
+AccessibilityAttributes& accessibilityAttributes(NSObject& object) {
+  if (!object.accessibility) {
+    object.accessibility.reset(new AccessibilityAttributes);
+  }
+  return *object.accessibility;
+}
+
+namespace {
+
+AccessibilityAttributes::Blocks& blocksOf(NSObject& object) {
+  auto& blocks = accessibilityAttributes(object).blocks;
+  if (!blocks) {
+    blocks = std::make_unique<AccessibilityAttributes::Blocks>();
+  }
+  return *blocks;
+}
+
+/// The block of that kind, or nullptr when none is set.
+template <class Block>
+const Block* blockOf(const NSObject& self, Block AccessibilityAttributes::Blocks::*kind) {
+  if (!self.accessibility || !self.accessibility->blocks) {
+    return nullptr;
+  }
+  const Block& block = (*self.accessibility->blocks).*kind;
+  return block ? &block : nullptr;
+}
+
+// The first two answers of each attribute; the third is the class's own.
+
+id label(NSObject* self) {
+  if (const LabelBlock* block = blockOf(*self, &AccessibilityAttributes::Blocks::label)) {
+    return LabelBlock(*block)();
+  }
+  if (self->accessibility && self->accessibility->label) {
+    return self->accessibility->label;
+  }
+  return send<id>(self, "_naturalAccessibilityLabel");
+}
+
+id valueOf(NSObject* self) {
+  if (const LabelBlock* block = blockOf(*self, &AccessibilityAttributes::Blocks::value)) {
+    return LabelBlock(*block)();
+  }
+  if (self->accessibility && self->accessibility->value) {
+    return self->accessibility->value;
+  }
+  return send<id>(self, "_naturalAccessibilityValue");
+}
+
+bool isElement(NSObject* self) {
+  if (const FlagBlock* block = blockOf(*self, &AccessibilityAttributes::Blocks::isElement)) {
+    return FlagBlock(*block)();
+  }
+  if (self->accessibility && self->accessibility->isElement.has_value()) {
+    return *self->accessibility->isElement;
+  }
+  return send<bool>(self, "_naturalIsAccessibilityElement");
+}
+
+bool activate(NSObject* self) {
+  if (const FlagBlock* block = blockOf(*self, &AccessibilityAttributes::Blocks::activate)) {
+    return FlagBlock(*block)();
+  }
+  return send<bool>(self, "_naturalAccessibilityActivate");
+}
+
+UIAccessibilityTraits traits(NSObject* self) {
+  return self->accessibility && self->accessibility->traits.has_value()
+             ? *self->accessibility->traits
+             : send<UIAccessibilityTraits>(self, "_naturalAccessibilityTraits");
+}
+
+id container(NSObject* self) {
+  if (self->accessibility) {
+    if (const id set = self->accessibility->container.strong()) {
+      return set;
+    }
+  }
+  return send<id>(self, "_naturalAccessibilityContainer");
+}
+
+id ancestorOfKind(NSObject* self, Class* isa) {
+  constexpr int deepest = 1000;  // containers may form a cycle
+  id each = trySend<id>(self, "accessibilityContainer");
+  for (int depth = 0; each && depth < deepest; ++depth) {
+    if (isKindOf(each.get(), isa)) {
+      return each;
+    }
+    each = trySend<id>(each, "accessibilityContainer");
+  }
+  return nullptr;
+}
+
+CGRect frame(NSObject* self) {
+  if (self->accessibility && self->accessibility->frameInContainerSpace.has_value()) {
+    auto view = as<UIView>(trySend<id>(self, "accessibilityContainer"));
+    if (!view) {
+      view = as<UIView>(ancestorOfKind(self, classOf<UIView>()));
+    }
+    return UIAccessibilityConvertFrameToScreenCoordinates(
+        *self->accessibility->frameInContainerSpace, view);
+  }
+  if (self->accessibility && self->accessibility->frame.has_value()) {
+    return *self->accessibility->frame;
+  }
+  return send<CGRect>(self, "_naturalAccessibilityFrame");
+}
+
+CGPoint activationPoint(NSObject* self) {
+  return self->accessibility && self->accessibility->activationPoint.has_value()
+             ? *self->accessibility->activationPoint
+             : send<CGRect>(self, "accessibilityFrame").center();
+}
+
+id elements(NSObject* self) {
+  if (self->accessibility && self->accessibility->elements) {
+    return self->accessibility->elements;
+  }
+  return send<id>(self, "_naturalAccessibilityElements");
+}
+
+/// What is stored and read without a natural answer of a class.
+template <auto Member>
+auto stored(NSObject* self) {
+  using Value = std::remove_cvref_t<decltype(std::declval<AccessibilityAttributes>().*Member)>;
+  return self->accessibility ? (*self->accessibility).*Member : Value();
+}
+
+template <auto Member, class Value>
+void store(NSObject* self, Value value) {
+  accessibilityAttributes(*self).*Member = value;
+}
+
+template <auto Kind, class Block>
+void storeBlock(NSObject* self, Block block) {
+  blocksOf(*self).*Kind = std::move(block);
+}
+
+void setFrame(NSObject* self, CGRect rect) {
+  accessibilityAttributes(*self).frame = rect;
+  accessibilityAttributes(*self).frameInContainerSpace.reset();
+}
+
+void setContainer(NSObject* self, id object) {
+  accessibilityAttributes(*self).container = Weak<>(object.get());
+}
+
+void addTrait(NSObject* self, UIAccessibilityTraits trait) {
+  send<void>(self, "setAccessibilityTraits:",
+             send<UIAccessibilityTraits>(self, "accessibilityTraits") | trait);
+}
+
+id labelForKeys(NSObject* self, Ref<NSString> keys) {
+  return stringForLabelKeyValues(id(self), utf8(keys));
+}
+
+template <class Answer>
+Answer nothing(NSObject* /*self*/) {
+  return Answer();
+}
+bool alwaysVisible(NSObject* /*self*/) { return true; }
+id hitNothing(NSObject* self, CGPoint /*point*/, id /*event*/) { return self; }
+
+using Attributes = AccessibilityAttributes;
+using Blocks = AccessibilityAttributes::Blocks;
+using Traits = UIAccessibilityTraits;
+
+const Registered attributes =
+    extendClass("NSObject")
+        .method<&label>("accessibilityLabel")
+        .method<&store<&Attributes::label, id>>("setAccessibilityLabel:")
+        .method<&stored<&Attributes::label>>("accessibilityUserDefinedLabel")
+        .method<&valueOf>("accessibilityValue")
+        .method<&store<&Attributes::value, id>>("setAccessibilityValue:")
+        .method<&stored<&Attributes::hint>>("accessibilityHint")
+        .method<&store<&Attributes::hint, id>>("setAccessibilityHint:")
+        .method<&isElement>("isAccessibilityElement")
+        .method<&store<&Attributes::isElement, bool>>("setIsAccessibilityElement:")
+        .method<&traits>("accessibilityTraits")
+        .method<&store<&Attributes::traits, Traits>>("setAccessibilityTraits:")
+        .method<&addTrait>("_accessibilityAddTrait:")
+        .method<&frame>("accessibilityFrame")
+        .method<&setFrame>("setAccessibilityFrame:")
+        .method<&store<&Attributes::frameInContainerSpace, CGRect>>(
+            "setAccessibilityFrameInContainerSpace:")
+        .method<&nothing<id>>("accessibilityPath")
+        .method<&activationPoint>("accessibilityActivationPoint")
+        .method<&store<&Attributes::activationPoint, CGPoint>>("setAccessibilityActivationPoint:")
+        .method<&container>("accessibilityContainer")
+        .method<&setContainer>("setAccessibilityContainer:")
+        .method<&elements>("accessibilityElements")
+        .method<&store<&Attributes::elements, Ref<NSArray>>>("setAccessibilityElements:")
+        .method<&stored<&Attributes::elementsHidden>>("accessibilityElementsHidden")
+        .method<&store<&Attributes::elementsHidden, bool>>("setAccessibilityElementsHidden:")
+        .method<&stored<&Attributes::viewIsModal>>("accessibilityViewIsModal")
+        .method<&store<&Attributes::viewIsModal, bool>>("setAccessibilityViewIsModal:")
+        .method<&stored<&Attributes::identification>>("accessibilityIdentification")
+        .method<&store<&Attributes::identification, id>>("accessibilitySetIdentification:");
+
+const Registered behaviour =
+    extendClass("NSObject")
+        .method<&activate>("accessibilityActivate")
+        .method<&nothing<void>>("accessibilityIncrement")
+        .method<&nothing<void>>("accessibilityDecrement")
+        .method<&nothing<void>>("_accessibilityLoadAccessibilityInformation")
+        .method<&nothing<std::int64_t>>("_accessibilityExpandedStatus")
+        .method<&hitNothing>("_accessibilityHitTest:withEvent:")
+        .method<&store<&Attributes::overridesInvisibility, bool>>(
+            "_accessibilitySetOverridesInvisibility:")
+        .method<&store<&Attributes::viewIsVisible, bool>>("_accessibilitySetViewIsVisible:")
+        .method<&alwaysVisible>("_accessibilityViewIsVisible")
+        .method<&storeBlock<&Blocks::label, LabelBlock>>("_setAccessibilityLabelBlock:")
+        .method<&storeBlock<&Blocks::value, LabelBlock>>("_setAccessibilityValueBlock:")
+        .method<&storeBlock<&Blocks::isElement, FlagBlock>>("_setIsAccessibilityElementBlock:")
+        .method<&storeBlock<&Blocks::activate, FlagBlock>>("_setAccessibilityActivateBlock:")
+        .method<&ancestorOfKind>("_accessibilityAncestorIsKindOf:")
+        .method<&labelForKeys>("_accessibilityStringForLabelKeyValues:")
+        .method<&nothing<bool>>("_naturalIsAccessibilityElement")
+        .method<&nothing<bool>>("_naturalAccessibilityActivate")
+        .method<&nothing<id>>("_naturalAccessibilityLabel")
+        .method<&nothing<id>>("_naturalAccessibilityValue")
+        .method<&nothing<Traits>>("_naturalAccessibilityTraits")
+        .method<&nothing<CGRect>>("_naturalAccessibilityFrame")
+        .method<&nothing<id>>("_naturalAccessibilityElements")
+        .method<&nothing<id>>("_naturalAccessibilityContainer");
+
+bool elementIsElement(NSObject* /*self*/) { return true; }
+
+const Registered elementClass =
+    defineClass<UIAccessibilityElement, NSObject>()
+        .method<&UIAccessibilityElement::initWithAccessibilityContainer>(
+            "initWithAccessibilityContainer:")
+        .method<&elementIsElement>("_naturalIsAccessibilityElement");
+
+const Registered aggregateClass =
+    defineClass<UIAccessibilityAggregateElement, UIAccessibilityElement>()
+        .method<&UIAccessibilityAggregateElement::initWithContainerAndElements>(
+            "initWithAccessibilityContainer:representedElements:")
+        .method<&UIAccessibilityAggregateElement::naturalFrame>("_naturalAccessibilityFrame")
+        .variable<&UIAccessibilityAggregateElement::representedElements>("_representedElements");
+
+NotificationObserver& observer() {
+  static NotificationObserver current;
+  return current;
+}
+
+}  // namespace
+
+id UIAccessibilityElement::initWithAccessibilityContainer(const id& container) {
+  accessibilityAttributes(*this).container = Weak<>(container.get());
+  return this;
+}
+
+Ref<UIAccessibilityElement> accessibilityElementWithContainer(const id& container) {
+  auto element = make<UIAccessibilityElement>();
+  return as<UIAccessibilityElement>(
+      send<id>(element, "initWithAccessibilityContainer:", container));
+}
+
+id UIAccessibilityAggregateElement::initWithContainerAndElements(const id& container,
+                                                                 const Ref<NSArray>& elements) {
+  representedElements = elements;
+  return initWithAccessibilityContainer(container);
+}
+
+CGRect UIAccessibilityAggregateElement::naturalFrame() {
+  return UIAXFrameForElements(representedElements);
+}
+
+void UIAccessibilityPostNotification(UIAccessibilityNotification notification, const id& argument) {
+  if (const NotificationObserver current = observer()) {
+    current(notification, argument);
+  }
+}
+
+void setAccessibilityNotificationObserver(NotificationObserver current) {
+  observer() = std::move(current);
+}
+
+bool UIAccessibilityIsScreenReaderRunning() { return Settings::current().screenReaderRuns; }
+
+CGRect UIAccessibilityConvertFrameToScreenCoordinates(const CGRect& rect, const Ref<UIView>& view) {
+  CGRect converted = rect;
+  for (Ref<UIView> each = view; each; each = each->superview()) {
+    const CGPoint scrolled = each->bounds().origin;
+    converted.origin.x += each->frame().origin.x - scrolled.x;
+    converted.origin.y += each->frame().origin.y - scrolled.y;
+  }
+  return converted;
+}
+
+}  // namespace tavro

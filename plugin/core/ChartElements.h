@@ -1,0 +1,42 @@
+#pragma once
+
+#include "platform/accessibility/KeyAccess.h"
+#include "platform/foundation/Formatters.h"
+#include "platform/uikit/UIAccessibility.h"
+
+// What the chart categories share: a chart keeps the host's points and the elements that were built
+// of them as retained values; loading renews the points and drops the elements.
+
+namespace tavro {
+
+/// Reads the host's array under `key`. When its first object is of that class, keeps the array
+/// under `retainedKey`; otherwise drops what was kept. Drops the element list either way.
+void loadGraphData(Object* chart, Name key, Name firstObjectClass, Name retainedKey);
+
+/// The chart's element list. Without one, an empty list is kept at once, so that a request during
+/// the build gets the same list, and then filled by `build(list)`.
+template <class Build>
+id elementsBuiltOnce(Object* chart, std::size_t capacity, const Build& build) {
+  if (const id built = _accessibilityValueForKey(chart, kUIAccessibilityStorageKeyChildren)) {
+    return built;
+  }
+  const Ref<NSMutableArray> elements = mutableArray(capacity);
+  _accessibilitySetRetainedValue(chart, elements, kUIAccessibilityStorageKeyChildren);
+  build(*elements);
+  _accessibilitySetRetainedValue(chart, elements, kUIAccessibilityStorageKeyChildren);
+  return elements;
+}
+
+/// Adds an element for a part of a chart; the frame is in the chart's own coordinates.
+void addChartElement(NSMutableArray& elements, const Ref<UIView>& chart, const CGRect& frame,
+                     const id& label, const id& value);
+
+/// The spoken span of a part of the day: from `start` seconds after the day's beginning for
+/// `length` seconds, by a template.
+Ref<NSString> spanOfDay(NSDateIntervalFormatter& formatter, std::string_view dateTemplate,
+                        const Ref<NSDate>& startOfDay, double start, double length);
+
+/// Makes a chart's title-and-value pair one heading that says both; nothing happens to nil.
+void annotateLabelPair(const id& labelPair);
+
+}  // namespace tavro

@@ -1,0 +1,50 @@
+#pragma once
+
+#include "platform/foundation/NSDate.h"
+#include "platform/foundation/NSString.h"
+#include "platform/healthkit/HKUnit.h"
+
+// The functions that the bundle exports, found by exactly these symbols. They take and yield the
+// platform's references, which C cannot spell; only C++ calls them.
+#if defined(__clang__)
+#pragma clang diagnostic push
+#pragma clang diagnostic ignored "-Wreturn-type-c-linkage"
+#endif
+
+extern "C" {
+
+/// The plug-in's text for a key of its table "Accessibility", in the user's language: the key
+/// itself when the table lacks it, nil when the plug-in's bundle cannot be found.
+tavro::Ref<tavro::NSString> accessibilityLocalizedString(const tavro::Ref<tavro::NSString>& key);
+
+/// The index of the date's day in the host's activity cache. Always a day of the Gregorian
+/// calendar, whatever the user's calendar is.
+std::int64_t CHCacheIndexForDate(const tavro::Ref<tavro::NSDate>& date);
+
+/// The unit in which a trend of that type (0 to 8) is measured; nil for any other type.
+tavro::Ref<tavro::HKUnit> accessibilityHKUnitForTrendType(std::int64_t trendType);
+
+/// The title of an `ACHAchievement` for the user's name and wheelchair setting, both taken at the
+/// first call of the process; nil for any other object.
+tavro::Ref<tavro::NSString> accessibilityLocalizedStringForAchievement(
+    const tavro::id& achievement);
+
+}  // extern "C"
+
+#if defined(__clang__)
+#pragma clang diagnostic pop
+#endif
+
+namespace tavro {
+
+/// Whether the user is a wheelchair user, while the screen reader runs. The first call with the
+/// screen reader on asks the health store; later ones answer with what the store said last and ask
+/// again in the background. With the screen reader off nothing is asked.
+bool _userIsWheelchairUserWithNarrelOn();
+
+/// `accessibilityLocalizedString` of a key that is written out.
+inline Ref<NSString> localized(std::string_view key) {
+  return accessibilityLocalizedString(string(key));
+}
+
+}  // namespace tavro
