@@ -55,13 +55,11 @@ class Joiner {
 };
 
 bool isText(const id& object) {
-  return isKindOf(object.get(), classOf<NSString>()) ||
-         isKindOf(object.get(), classOf<NSAttributedString>());
+  return isA<NSString>(object.get()) || isA<NSAttributedString>(object.get());
 }
 
 bool isInvisibleView(const id& object) {
-  return isKindOf(object.get(), classOf<UIView>()) &&
-         !trySend<bool>(object, "_accessibilityViewIsVisible");
+  return isA<UIView>(object.get()) && !trySend<bool>(object, "_accessibilityViewIsVisible");
 }
 
 }  // namespace

@@ -14,7 +14,7 @@ constexpr std::size_t kDeepestNesting = 200;
 using Path = std::vector<const Object*>;
 
 bool isSilent(const id& object) {
-  const bool isView = isKindOf(object.get(), classOf<UIView>());
+  const bool isView = isA<UIView>(object.get());
   return trySend<bool>(object, "accessibilityElementsHidden") ||
          (isView && !trySend<bool>(object, "_accessibilityViewIsVisible"));
 }

@@ -215,6 +215,7 @@ class ClassRegistry {
   void forget(Name name) {
     const std::lock_guard lock(runtimeMutex());
     std::erase_if(classes_, [&](const Class* each) { return each->name() == name; });
+    forgotten_.push_back(name);
     publish();
   }
 
@@ -272,8 +273,8 @@ class ClassRegistry {
     if (!declaration.extendsOnly) {
       Class* const superclass = find(declaration.superclass);
       isa = new Class(declaration, superclass, false);
-      // A root metaclass inherits the root class's instance methods, as every object does.
-      auto* meta = new Class(declaration, superclass == nullptr ? isa : superclass->isa(), true);
+      auto* meta =
+          new Class(declaration, superclass == nullptr ? nullptr : superclass->isa(), true);
       isa->becomeInstanceOf(meta);
       meta->becomeInstanceOf(meta);
       isa->retain();
@@ -290,7 +291,9 @@ class ClassRegistry {
 
   /// Why a declaration cannot be carried out; empty when it can.
   std::string refusal(const ClassDeclaration& declaration) {
-    if (!declaration.extendsOnly && find(declaration.name) != nullptr) {
+    const bool isTaken = find(declaration.name) != nullptr ||
+                         std::ranges::find(forgotten_, declaration.name) != forgotten_.end();
+    if (!declaration.extendsOnly && isTaken) {
       return "a class of this name is already registered";
     }
     std::vector<Name> names{declaration.name};
@@ -324,6 +327,7 @@ class ClassRegistry {
 
   std::vector<ClassDeclaration> pending_;
   std::vector<Class*> classes_;
+  std::vector<Name> forgotten_;
   std::vector<RegistrationProblem> problems_;
   std::vector<std::unique_ptr<DirectoryTable>> directories_;
   std::atomic<const DirectoryTable*> directory_{nullptr};

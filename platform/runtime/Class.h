@@ -69,7 +69,8 @@ struct ClassDeclaration {
 };
 
 /// A class and, as one mechanism, its metaclass: a class object's own class, whose methods are the
-/// class methods. Found by name; never destroyed. Lookup is safe from any thread.
+/// class methods (those alone: a class object does not answer instance methods). Found by name;
+/// never destroyed. Lookup is safe from any thread.
 class Class final : public Object {
  public:
   /// The class of that name, or nullptr when none is loaded.
@@ -171,7 +172,7 @@ void declareClass(ClassDeclaration declaration) noexcept;
 std::vector<RegistrationProblem> registrationProblems();
 /// The classes declared by the bundle at that path, in the order of their declaration.
 std::vector<Class*> classesOfImage(std::string_view image);
-/// Removes a class from lookup by name; its instances stay usable.
+/// Removes a class from lookup by name; its instances stay usable and its name stays taken.
 void forgetClass(Name name);
 
 /// While one exists, declarations are recorded as coming from the bundle at `path`.
@@ -183,10 +184,9 @@ class ImageScope {
   ImageScope& operator=(const ImageScope&) = delete;
 };
 
-/// True when the object is nil-safe an instance of that class or of a subclass of it.
+/// Whether the object is an instance of that class or of a subclass of it; NO for nil.
 inline bool isKindOf(const Object* object, const Class* isa) {
-  return object != nullptr && isa != nullptr &&
-         (object->isa() == isa || object->isa()->isSubclassOf(isa));
+  return object != nullptr && isa != nullptr && object->isa()->isSubclassOf(isa);
 }
 
 /// The class that a native type stands for, or nullptr when it is not loaded.
@@ -195,10 +195,25 @@ Class* classOf() {
   return Class::named(T::className);
 }
 
+/// Whether the object is an instance of the class that a native type stands for. A class's name is
+/// its own for the life of the process, so the names along the superclasses tell.
+template <class T>
+bool isA(const Object* object) {
+  if (object == nullptr || object->isa()->isMetaclass()) {
+    return false;
+  }
+  for (const Class* each = object->isa(); each != nullptr; each = each->superclass()) {
+    if (each->name() == T::className) {
+      return true;
+    }
+  }
+  return false;
+}
+
 /// The object as a `T` when it is one, else nil.
 template <class T>
 Ref<T> as(const id& object) {
-  return isKindOf(object.get(), classOf<T>()) ? Ref<T>(static_cast<T*>(object.get())) : Ref<T>();
+  return isA<T>(object.get()) ? Ref<T>(static_cast<T*>(object.get())) : Ref<T>();
 }
 
 }  // namespace tavro

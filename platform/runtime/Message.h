@@ -55,7 +55,7 @@ decltype(auto) receive(TravelArgument<T> argument) {
   } else if constexpr (kIsReference<Value> ||
                        (kIsObjectPointer<Value> && !std::is_same_v<Value, Class*>)) {
     using Target = std::remove_pointer_t<decltype(std::declval<Value>().operator->())>;
-    if (argument != nullptr && !isKindOf(argument, classOf<Target>())) {
+    if (argument != nullptr && !isA<Target>(argument)) {
       raiseWrongClass(argument, Target::className);
     }
     return Value(static_cast<Target*>(argument));

@@ -37,8 +37,7 @@ bool UICellView::naturalIsElement() {
   }
   const std::vector<id> inside = accessibleDescendants(this);
   return !inside.empty() && std::ranges::all_of(inside, [](const id& element) {
-    return isKindOf(element.get(), classOf<UILabel>()) ||
-           isKindOf(element.get(), classOf<UIImageView>());
+    return isA<UILabel>(element.get()) || isA<UIImageView>(element.get());
   });
 }
 
