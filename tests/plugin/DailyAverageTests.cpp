@@ -208,14 +208,6 @@ TEST_F(DailyAverageTest, WeekdaysAreNamedInTheUsersLanguageWhateverTheCalendar) 
   }
 }
 
-TEST_F(DailyAverageTest, WithoutATitleTheColumnsAreStillListedFromTheTop) {
-  const auto week = usualWeek();
-  week->title = nullptr;
-  const Ref<NSArray> elements = elementsOf(week);
-  EXPECT_EQ(elements->count(), 7U);
-  EXPECT_EQ(send<CGRect>((*elements)[0], "accessibilityFrame"), CGRect(10, 0, 40, 120));
-}
-
 TEST_F(DailyAverageTest, TheListIsBuiltOnceALayout) {
   const auto week = usualWeek();
   id seen;

@@ -181,7 +181,7 @@ TEST_F(TrendViewsTest, EveryTypeOfTrendIsSaidInItsUnit) {
     spoken.resize(6);
     EXPECT_EQ(spoken,
               (Utterances{
-                  "Trending up, Last 90 days, " + std::string(shown[type]) + ", Last 365 days, --",
+                  "Trending up, Last 90 days: " + std::string(shown[type]) + ", Last 365 days: --",
                   "It Over the Year, heading", "January 1, 1970, 1.5 " + unit,
                   "January 3, 1970, 0 " + unit, "It by Weekday, heading",
                   "Monday, 365-day average, 3.25 " + unit + ", 90-day average, 0 " + unit}));

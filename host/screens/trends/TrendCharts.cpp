@@ -95,28 +95,19 @@ id TrendDetailChartView::init() {
 
 void TrendDetailChartView::setTrend(const Trend& trend) {
   setTitle(trend, "Over the Year");
-  trendBars_ = trend.bars;
+  trendBars_.clear();
   std::vector<std::optional<double>> amounts;
-  for (const TrendBar& bar : trendBars_) {
+  for (const TrendBar& bar : trend.bars) {
+    trendBars_.push_back({quantityOf(bar.value), dateInterval(noonOf(bar.start), noonOf(bar.end))});
     amounts.push_back(bar.value);
   }
   setAmounts(std::move(amounts));
   chartMaxLabel_->setText(string(shownAmount(trend.type, maximum())));
 }
 
-const TrendBar* TrendDetailChartView::barAt(std::int64_t index) const {
-  return index >= 0 && index < std::ssize(trendBars_) ? &trendBars_[static_cast<std::size_t>(index)]
-                                                      : nullptr;
-}
-
-id TrendDetailChartView::accessibilityQuantityForIndex(std::int64_t index) {
-  const TrendBar* const bar = barAt(index);
-  return bar == nullptr ? id() : quantityOf(bar->value);
-}
-
-id TrendDetailChartView::accessibilityDateIntervalForIndex(std::int64_t index) {
-  const TrendBar* const bar = barAt(index);
-  return bar == nullptr ? id() : id(dateInterval(noonOf(bar->start), noonOf(bar->end)));
+TrendDetailChartView::Bar TrendDetailChartView::barAt(std::int64_t index) const {
+  const bool exists = index >= 0 && index < std::ssize(trendBars_);
+  return exists ? trendBars_[static_cast<std::size_t>(index)] : Bar();
 }
 
 void TrendDetailChartView::layoutSubviews() {

@@ -55,14 +55,19 @@ class TrendDetailChartView : public TrendChartView {
 
   id barStops() { return stops_; }
   id chartMaxLabel() { return chartMaxLabel_; }
-  id accessibilityQuantityForIndex(std::int64_t index);
-  id accessibilityDateIntervalForIndex(std::int64_t index);
+  id accessibilityQuantityForIndex(std::int64_t index) { return barAt(index).quantity; }
+  id accessibilityDateIntervalForIndex(std::int64_t index) { return barAt(index).interval; }
   void layoutSubviews();
 
  private:
-  [[nodiscard]] const TrendBar* barAt(std::int64_t index) const;
+  struct Bar {
+    id quantity;
+    id interval;
+  };
+  /// An empty bar for an index without one.
+  [[nodiscard]] Bar barAt(std::int64_t index) const;
 
-  std::vector<TrendBar> trendBars_;
+  std::vector<Bar> trendBars_;
   Ref<NSArray> stops_;
   Ref<UILabel> chartMaxLabel_;
 };

@@ -76,18 +76,16 @@ void TrendsViewController::appendSection(UITableView& table, TrendDirection dire
 }
 
 void TrendDetailSummaryView::setTrend(const Trend& trend) {
-  const double half = (kContent.size.width - 2 * kMargin) / 2;
-  const auto heading = makeLabel(trend.title, {kMargin, 0, 2 * half, kLine});
-  send<void>(heading, "setAccessibilityTraits:", UIAccessibilityTraitHeader);
-  addSubview(heading);
-  addSubview(makeLabel(textOfDirection(trend.direction), {kMargin, kLine, 2 * half, kLine}));
-  const TrendAverages& averages = trend.averages;
-  addSubview(makeLabel("Last 90 days", {kMargin, 2 * kLine, half, kLine}));
-  addSubview(makeLabel(shownAmount(trend.type, averages.average90),
-                       {kMargin + half, 2 * kLine, half, kLine}));
-  addSubview(makeLabel("Last 365 days", {kMargin, 3 * kLine, half, kLine}));
-  addSubview(makeLabel(shownAmount(trend.type, averages.average365),
-                       {kMargin + half, 3 * kLine, half, kLine}));
+  const std::string texts[] = {
+      trend.title, std::string(textOfDirection(trend.direction)),
+      "Last 90 days: " + shownAmount(trend.type, trend.averages.average90),
+      "Last 365 days: " + shownAmount(trend.type, trend.averages.average365)};
+  double y = 0;
+  for (const std::string& text : texts) {
+    addSubview(makeLabel(text, {kMargin, y, kContent.size.width - 2 * kMargin, kLine}));
+    y += kLine;
+  }
+  send<void>(subviewList().front(), "setAccessibilityTraits:", UIAccessibilityTraitHeader);
 }
 
 void TrendDetailViewController::viewDidLoad() {

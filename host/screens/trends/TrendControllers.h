@@ -27,6 +27,7 @@ class TrendDetailSummaryView : public UIView {
   static constexpr Name className = "TavroApp.TrendDetailSummaryView";
   static constexpr double height = 132;
 
+  /// Once.
   void setTrend(const Trend& trend);
 };
 

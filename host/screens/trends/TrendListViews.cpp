@@ -1,6 +1,7 @@
 #include "host/screens/trends/TrendListViews.h"
 
 #include "host/screens/trends/TrendUnits.h"
+#include "platform/foundation/Language.h"
 
 namespace tavro {
 namespace {
@@ -97,13 +98,14 @@ void TrendPairTableViewCell::addTrend(const Trend& trend, TrendAction action) {
 
 void TrendPairTableViewCell::layoutSubviews() {
   const double width = frame().size.width / kTrends;
-  double x = 0;
+  const bool startsAtRight = userInterfaceIsRightToLeft();
+  double x = startsAtRight ? frame().size.width - width : 0;
   for (const Ref<UIView>& button : subviewList()) {
     button->setFrame({x, 0, width, frame().size.height});
     for (const Ref<UIView>& metric : button->subviewList()) {
       metric->setFrame({0, 0, width, kMetricHeight});
     }
-    x += width;
+    x += startsAtRight ? -width : width;
   }
 }
 

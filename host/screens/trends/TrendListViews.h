@@ -37,13 +37,15 @@ class TrendListMetricView : public UIView {
   Ref<NSString> trendString_;
 };
 
-/// The row of one or two trends side by side, each a button with a metric on it.
+/// The row of one or two trends side by side in reading direction, each a button with a metric on
+/// it.
 class TrendPairTableViewCell : public UITableViewCell {
  public:
   static constexpr Name className = "TavroApp.TrendPairTableViewCell";
   static constexpr double height = 96;
   static constexpr std::size_t kTrends = 2;
 
+  /// At most `kTrends` times.
   void addTrend(const Trend& trend, TrendAction action);
   void layoutSubviews();
 };
@@ -75,6 +77,7 @@ class TrendListHeaderView : public UIView {
   static constexpr Name className = "TavroApp.TrendListHeaderView";
   static constexpr double height = 44;
 
+  /// Once.
   void setDirection(TrendDirection direction);
 };
 
