@@ -73,7 +73,7 @@ class DailyAverageTest : public PluginTest {
     return arrayWithObjects(std::move(stops));
   }
   Ref<OddWeek> weekWith(const id& stops) {
-    const auto week = makeView<OddWeek>({0, 0, 300, 120.9});
+    auto week = makeView<OddWeek>({0, 0, 300, 120.9});
     week->stops = stops;
     show(week);
     return week;
@@ -131,6 +131,7 @@ TEST_F(DailyAverageTest, WithoutSevenUsableStopsOrAUnitThereIsTheTitleAlone) {
     const auto week = usualWeek();
     week->unit = unit;
     EXPECT_EQ(heard(week), kTitleAlone);
+    EXPECT_EQ(elementsOf(week)->count(), 1U) << "nothing silent stands in a column's place";
   }
 }
 

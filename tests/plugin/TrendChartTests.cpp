@@ -64,13 +64,13 @@ const Utterances kThreeBars{"Distance, heading", "January 1, 1970, 0 m", "Januar
 class TrendChartTest : public PluginTest {
  protected:
   static Ref<OddTrendChart> makeChart(const id& stops) {
-    const auto chart = makeView<OddTrendChart>({10, 100, 300, 200.7});
+    auto chart = makeView<OddTrendChart>({10, 100, 300, 200.7});
     chart->stops = stops;
     return chart;
   }
   /// A chart on screen, with stops at 0, 50 and 120.
   Ref<OddTrendChart> shownChart() {
-    const auto chart = makeChart(arrayWithObjects({number(0.0), number(50.0), number(120.0)}));
+    auto chart = makeChart(arrayWithObjects({number(0.0), number(50.0), number(120.0)}));
     show(chart);
     return chart;
   }

@@ -95,6 +95,18 @@ TEST_F(TrendViewsTest, ATrendThatGoesDownSaysItsMetricThenWhatToDo) {
   EXPECT_EQ(heard(cell), Utterances{"Flights, Trending down, 2,222 FLIGHTS, button"});
 }
 
+TEST_F(TrendViewsTest, TheTraitsThatTheHostGaveStay) {
+  const Ref<UIView> views[] = {makeView<TrendListMetricView>(),
+                               makeView<TrendingDownTableViewCell>(),
+                               makeView<TrendListHeaderView>()};
+  for (const Ref<UIView>& view : views) {
+    const auto own = send<UIAccessibilityTraits>(view, "accessibilityTraits");
+    send<void>(view, "setAccessibilityTraits:", UIAccessibilityTraitSelected);
+    EXPECT_EQ(send<UIAccessibilityTraits>(view, "accessibilityTraits"),
+              own | UIAccessibilityTraitSelected);
+  }
+}
+
 TEST_F(TrendViewsTest, TheButtonsOfAPairLetTheirMetricsBeHeard) {
   int taps = 0;
   const auto cell = makeView<TrendPairTableViewCell>({0, 0, 390, 96});
@@ -179,12 +191,12 @@ TEST_F(TrendViewsTest, EveryTypeOfTrendIsSaidInItsUnit) {
     Utterances spoken = heard(detail->view());
     ASSERT_EQ(spoken.size(), 12U) << unit;
     spoken.resize(6);
-    EXPECT_EQ(spoken,
-              (Utterances{
-                  "Trending up, Last 90 days: " + std::string(shown[type]) + ", Last 365 days: --",
-                  "It Over the Year, heading", "January 1, 1970, 1.5 " + unit,
-                  "January 3, 1970, 0 " + unit, "It by Weekday, heading",
-                  "Monday, 365-day average, 3.25 " + unit + ", 90-day average, 0 " + unit}));
+    const std::string summary = "Trending up, Last 90 days: ";
+    const std::string weekday = "Monday, 365-day average, 3.25 ";
+    EXPECT_EQ(spoken, (Utterances{summary + shown[type] + ", Last 365 days: --",
+                                  "It Over the Year, heading", "January 1, 1970, 1.5 " + unit,
+                                  "January 3, 1970, 0 " + unit, "It by Weekday, heading",
+                                  weekday + unit + ", 90-day average, 0 " + unit}));
     trend.weekdays.fill({});
     const auto withoutWeekdays = makeController<TrendDetailViewController>();
     withoutWeekdays->setTrend(&trend);

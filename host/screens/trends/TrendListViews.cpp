@@ -36,7 +36,7 @@ constexpr double kMetricHeight = 72;
 Ref<UIImageView> arrowView(TrendDirection direction) {
   const auto image = make<UIImage>();
   image->name = std::string("arrow ") + std::string(textOfDirection(direction));
-  const auto view = makeView<UIImageView>({0, 0, kLine, kLine});
+  auto view = makeView<UIImageView>({0, 0, kLine, kLine});
   view->setImage(image);
   return view;
 }
