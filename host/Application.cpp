@@ -7,6 +7,7 @@
 #include "host/libraries/Achievements.h"
 #include "host/libraries/ActivitySummaryCache.h"
 #include "host/screens/day/DayViewController.h"
+#include "host/screens/trends/TrendControllers.h"
 #include "platform/foundation/NSDate.h"
 
 namespace tavro {
@@ -20,12 +21,29 @@ Ref<UIViewController> makeDay(const Application& application) {
   return controller;
 }
 
+Ref<UIViewController> makeTrends(const Application& application) {
+  const auto controller = makeController<TrendsViewController>();
+  controller->setTrends(&application.diary().trends);
+  return controller;
+}
+
+Ref<UIViewController> makeTrend(const Application& application) {
+  const auto controller = makeController<TrendDetailViewController>();
+  const std::vector<Trend>& trends = application.diary().trends;
+  controller->setTrend(trends.empty() ? nullptr : &trends.front());
+  return controller;
+}
+
 struct Screen {
   std::string_view name;
   Ref<UIViewController> (*make)(const Application&);
 };
 
-constexpr Screen kScreens[] = {{"day", &makeDay}};
+constexpr Screen kScreens[] = {
+    {"day", &makeDay},
+    {"trends", &makeTrends},
+    {"trend", &makeTrend},
+};
 
 }  // namespace
 
