@@ -6,6 +6,7 @@
 #include "host/Dates.h"
 #include "host/libraries/Achievements.h"
 #include "host/libraries/ActivitySummaryCache.h"
+#include "host/screens/calendar/CalendarScreens.h"
 #include "host/screens/day/DayViewController.h"
 #include "platform/foundation/NSDate.h"
 
@@ -25,7 +26,12 @@ struct Screen {
   Ref<UIViewController> (*make)(const Application&);
 };
 
-constexpr Screen kScreens[] = {{"day", &makeDay}};
+constexpr Screen kScreens[] = {
+    {"day", &makeDay},
+    {"week", &makeWeek},
+    {"loading", &makeLoadingCalendar},
+    {"calendar", &makeCalendar},
+};
 
 }  // namespace
 
