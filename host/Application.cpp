@@ -6,6 +6,7 @@
 #include "host/Dates.h"
 #include "host/libraries/Achievements.h"
 #include "host/libraries/ActivitySummaryCache.h"
+#include "host/screens/calendar/CalendarScreens.h"
 #include "host/screens/day/DayViewController.h"
 #include "host/screens/trends/TrendControllers.h"
 #include "platform/foundation/NSDate.h"
@@ -41,6 +42,9 @@ struct Screen {
 
 constexpr Screen kScreens[] = {
     {"day", &makeDay},
+    {"week", &makeWeek},
+    {"loading", &makeLoadingCalendar},
+    {"calendar", &makeCalendar},
     {"trends", &makeTrends},
     {"trend", &makeTrend},
 };

@@ -8,6 +8,7 @@
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/Settings.h"
 #include "platform/runtime/Dispatch.h"
+#include "reader/SummaryDescription.h"
 
 namespace tavro {
 namespace {
@@ -55,7 +56,7 @@ Session::Session(const SessionOptions& options) {
   applySettings(options, diary);
   application_ = std::make_unique<Application>(std::move(diary));
   if (options.withPlugin) {
-    loadAccessibilityBundle(options.bundle);
+    letSummariesDescribeRings(loadAccessibilityBundle(options.bundle));
   }
 }
 

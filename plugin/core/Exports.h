@@ -29,6 +29,18 @@ tavro::Ref<tavro::HKUnit> accessibilityHKUnitForTrendType(std::int64_t trendType
 tavro::Ref<tavro::NSString> accessibilityLocalizedStringForAchievement(
     const tavro::id& achievement);
 
+/// The description of the date's three rings: what the day's summary in the host's activity cache
+/// answers for its fractions. nil when there is no summary, when one of its fractions is negative
+/// or not a number, and when nobody answers for the summary. `isCapped` is handed on.
+tavro::Ref<tavro::NSString> accessibilityTavroStringForDate(const tavro::Ref<tavro::NSDate>& date,
+                                                            bool isCapped);
+
+/// Three fractions as one sentence: each ring's name, then its per cent, where 1.0 is one hundred;
+/// what is below 0 or not a number counts as 0. When the fractions are capped, exactly 1.0 is said
+/// as a goal completed, and three of them as all goals completed.
+tavro::Ref<tavro::NSString> accessibilityDescriptionForPercentages(double move, double exercise,
+                                                                   double stand, bool isCapped);
+
 }  // extern "C"
 
 #if defined(__clang__)
