@@ -7,6 +7,8 @@
 #include "host/libraries/Achievements.h"
 #include "host/libraries/ActivitySummaryCache.h"
 #include "host/screens/day/DayViewController.h"
+#include "host/screens/workouts/NoHeartRateData.h"
+#include "host/screens/workouts/WorkoutRowScreens.h"
 #include "platform/foundation/NSDate.h"
 
 namespace tavro {
@@ -25,7 +27,12 @@ struct Screen {
   Ref<UIViewController> (*make)(const Application&);
 };
 
-constexpr Screen kScreens[] = {{"day", &makeDay}};
+constexpr Screen kScreens[] = {
+    {"day", &makeDay},
+    {"heart-rate", &makeHeartRate},
+    {"map", &makeMap},
+    {"no-heart-rate", &makeNoHeartRateData},
+};
 
 }  // namespace
 
