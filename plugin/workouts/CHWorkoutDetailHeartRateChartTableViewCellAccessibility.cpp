@@ -11,7 +11,7 @@ template <class T>
 Ref<T> firstSubview(const Ref<UIView>& view) {
   if (view) {
     for (const Ref<UIView>& subview : view->subviewList()) {
-      if (const Ref<T> found = as<T>(subview)) {
+      if (Ref<T> found = as<T>(subview)) {
         return found;
       }
     }

@@ -14,7 +14,7 @@ Workout readSample(const std::string& name) {
 }
 
 std::string writtenFile(const std::string& text) {
-  const std::string path =
+  std::string path =
       testing::TempDir() + testing::UnitTest::GetInstance()->current_test_info()->name();
   std::ofstream(path, std::ios::binary) << text;
   return path;
@@ -22,7 +22,7 @@ std::string writtenFile(const std::string& text) {
 
 Workout readText(const std::string& text) {
   const std::string path = writtenFile(text);
-  const Workout workout = readActivityFile(path);
+  Workout workout = readActivityFile(path);
   std::filesystem::remove(path);
   return workout;
 }

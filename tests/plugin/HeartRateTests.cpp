@@ -89,7 +89,7 @@ Ref<NSDate> momentAt(double offset) {
 
 template <class T = HKHeartRateSummaryReading>
 Ref<T> readingOf(double offset, const Ref<HKQuantity>& quantity) {
-  const auto reading = make<T>();
+  auto reading = make<T>();
   reading->moment = momentAt(offset);
   reading->heartRate = quantity;
   return reading;
@@ -103,7 +103,7 @@ Ref<HKQuantity> beats(double perMinute) {
 class HeartRateTest : public PluginTest {
  protected:
   Ref<CHWorkoutDetailHeartRateChartTableViewCell> rowOf(double duration, Readings readings) {
-    const auto row = as<CHWorkoutDetailHeartRateChartTableViewCell>(
+    auto row = as<CHWorkoutDetailHeartRateChartTableViewCell>(
         heartRateRow(workoutOf(duration, std::move(readings))));
     row->setFrame({0, 0, 390, CHWorkoutDetailHeartRateChartTableViewCell::height});
     show(row);
@@ -111,7 +111,7 @@ class HeartRateTest : public PluginTest {
   }
 
   static Ref<OddHeartRateChart> oddChartOf(const id& interval) {
-    const auto chart = makeView<OddHeartRateChart>();
+    auto chart = makeView<OddHeartRateChart>();
     chart->interval = interval;
     return chart;
   }

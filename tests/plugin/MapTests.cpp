@@ -16,7 +16,7 @@ Workout outdoors() {
 class MapTest : public PluginTest {
  protected:
   Ref<CHWorkoutDetailMapAndWeatherTableViewCell> rowOf(const Workout& workout) {
-    const auto row = as<CHWorkoutDetailMapAndWeatherTableViewCell>(mapAndWeatherRow(workout));
+    auto row = as<CHWorkoutDetailMapAndWeatherTableViewCell>(mapAndWeatherRow(workout));
     row->setFrame({0, 0, 390, CHWorkoutDetailMapAndWeatherTableViewCell::height});
     show(row);
     return row;
@@ -25,7 +25,7 @@ class MapTest : public PluginTest {
   /// A view of that class with these views in it and nothing else.
   template <class T>
   Ref<T> viewWith(const std::vector<Ref<UIView>>& parts, CGRect frame) {
-    const auto view = makeView<T>(frame);
+    auto view = makeView<T>(frame);
     const std::vector<Ref<UIView>> own = view->subviewList();
     for (const Ref<UIView>& each : own) {
       each->removeFromSuperview();
@@ -105,6 +105,7 @@ TEST_F(MapTest, TheWeatherCoversItsPartsFromItsOwnOrigin) {
   };
   for (const auto& [parts, covered] : cases) {
     std::vector<Ref<UIView>> views;
+    views.reserve(parts.size() + 1);
     for (const CGRect& frame : parts) {
       views.emplace_back(makeLabel("part", frame));
     }

@@ -52,7 +52,7 @@ const Registered quantityAdditions =
     extendClass(HKQuantity::className).method<&beatsPerMinute>("ch_beatsPerMinute");
 
 id readingAt(const Ref<NSDate>& start, const HeartRateReading& measured) {
-  const auto reading = make<HKHeartRateSummaryReading>();
+  auto reading = make<HKHeartRateSummaryReading>();
   reading->moment = dateByAddingTimeInterval(start, measured.offset);
   reading->heartRate = HKQuantity::quantityWithUnit(beatsPerMinuteUnit(), measured.beatsPerMinute);
   return reading;
@@ -143,7 +143,7 @@ void CHWorkoutDetailHeartRateChartTableViewCell::layoutSubviews() {
 }
 
 Ref<UIView> heartRateRow(const Workout& workout) {
-  const auto row = makeView<CHWorkoutDetailHeartRateChartTableViewCell>();
+  auto row = makeView<CHWorkoutDetailHeartRateChartTableViewCell>();
   row->setWorkout(workout);
   return row;
 }

@@ -157,7 +157,7 @@ Ref<UIView> mapAndWeatherRow(const Workout& workout) {
   if (!workout.route && !workout.weather) {
     return nullptr;
   }
-  const auto row = makeView<CHWorkoutDetailMapAndWeatherTableViewCell>();
+  auto row = makeView<CHWorkoutDetailMapAndWeatherTableViewCell>();
   row->setWorkout(workout);
   return row;
 }

@@ -21,7 +21,7 @@ Ref<UIViewController> screenOfRow(const Application& application, std::string_vi
   } else {
     table->appendRow(makeLabel(absence), kTextHeight);
   }
-  const auto controller = makeController<UIViewController>();
+  auto controller = makeController<UIViewController>();
   controller->navigationItem()->title = string(title);
   controller->setView(table);
   return controller;
