@@ -149,7 +149,7 @@ TEST_F(HeartRateTest, ASliceSaysItsRateOrItsRange) {
   } cases[] = {
       {{{10, 120}, {20, 121.4}, {30, 119.6}}, "120 to 121 beats per minute"},
       {{{10, 87.5}, {20, 88.4}}, "88 beats per minute"},
-      {{{10, 71.5}}, "72 beats per minute"},
+      {{{10, 70.5}}, "71 beats per minute"},
       {{{10, 150}, {20, 90}, {30, 120}}, "90 to 150 beats per minute"},
       {{{400, 120}}, ""},
       {{}, ""},
