@@ -9,6 +9,8 @@
 #include "host/screens/calendar/CalendarScreens.h"
 #include "host/screens/day/DayViewController.h"
 #include "host/screens/trends/TrendControllers.h"
+#include "host/screens/workouts/NoHeartRateData.h"
+#include "host/screens/workouts/WorkoutRowScreens.h"
 #include "platform/foundation/NSDate.h"
 
 namespace tavro {
@@ -47,6 +49,9 @@ constexpr Screen kScreens[] = {
     {"calendar", &makeCalendar},
     {"trends", &makeTrends},
     {"trend", &makeTrend},
+    {"heart-rate", &makeHeartRate},
+    {"map", &makeMap},
+    {"no-heart-rate", &makeNoHeartRateData},
 };
 
 }  // namespace

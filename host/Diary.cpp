@@ -48,6 +48,7 @@ constexpr Choice<HKWorkoutActivityType> kWorkoutTypes[] = {
     {"cycling", HKWorkoutActivityType::cycling}, {"hiking", HKWorkoutActivityType::hiking},
     {"running", HKWorkoutActivityType::running}, {"swimming", HKWorkoutActivityType::swimming},
     {"walking", HKWorkoutActivityType::walking}, {"yoga", HKWorkoutActivityType::yoga},
+    {"other", HKWorkoutActivityType::other},
 };
 constexpr Choice<TrendDirection> kTrendDirections[] = {
     {"up", TrendDirection::up},
@@ -270,6 +271,19 @@ Diary Diary::read(const std::string& path) {
   Diary diary;
   fill(Place(json, path), diary);
   return diary;
+}
+
+const Workout* Diary::latestWorkout() const {
+  const Workout* latest = nullptr;
+  double latestStart = 0;
+  for (const Workout& workout : workouts) {
+    const double start = secondsFromIso(workout.start.iso).value_or(0);
+    if (workout.isImported || latest == nullptr || (!latest->isImported && start > latestStart)) {
+      latest = &workout;
+      latestStart = start;
+    }
+  }
+  return latest;
 }
 
 }  // namespace tavro

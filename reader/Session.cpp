@@ -4,6 +4,7 @@
 #include <stdexcept>
 #include <utility>
 
+#include "host/ActivityFile.h"
 #include "platform/foundation/Language.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/Settings.h"
@@ -53,6 +54,9 @@ SessionOptions optionsBesideProgram() {
 Session::Session(const SessionOptions& options) {
   setReaderResources(options.reader);
   Diary diary = Diary::read(options.diary);
+  if (options.activity) {
+    diary.workouts.push_back(readActivityFile(*options.activity));
+  }
   applySettings(options, diary);
   application_ = std::make_unique<Application>(std::move(diary));
   if (options.withPlugin) {
