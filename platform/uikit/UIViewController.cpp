@@ -132,7 +132,8 @@ UIWindow::~UIWindow() {
 void UIWindow::makeKey() { keyWindowOfProcess = this; }
 
 void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
-  for (const id& view : *subviews()) {
+  const Ref<NSArray> shown = subviews();
+  for (const id& view : *shown) {
     as<UIView>(view)->removeFromSuperview();
   }
   controller_ = controller;
