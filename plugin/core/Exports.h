@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/foundation/NSAttributedString.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/NSString.h"
 #include "platform/healthkit/HKUnit.h"
@@ -28,6 +29,13 @@ tavro::Ref<tavro::HKUnit> accessibilityHKUnitForTrendType(std::int64_t trendType
 /// first call of the process; nil for any other object.
 tavro::Ref<tavro::NSString> accessibilityLocalizedStringForAchievement(
     const tavro::id& achievement);
+
+/// A label's text, given as a string or an attributed string, with its first pace (8'05'') replaced
+/// by its whole seconds and those marked as a duration of minutes and seconds. The text for "no
+/// data" when a dash placeholder is anywhere in it; the text as it is when it holds no pace; nil
+/// for nil and for an empty text. Attributes of the text itself are not kept.
+tavro::Ref<tavro::AXAttributedString> accessibilityAttributedStringForPaceContainingString(
+    const tavro::id& text);
 
 }  // extern "C"
 
