@@ -7,6 +7,9 @@
 #include "host/libraries/Achievements.h"
 #include "host/libraries/ActivitySummaryCache.h"
 #include "host/screens/day/DayViewController.h"
+#include "host/screens/workouts/WorkoutDetailController.h"
+#include "host/screens/workouts/WorkoutRecords.h"
+#include "host/screens/workouts/WorkoutsListController.h"
 #include "platform/foundation/NSDate.h"
 
 namespace tavro {
@@ -20,12 +23,30 @@ Ref<UIViewController> makeDay(const Application& application) {
   return controller;
 }
 
+Ref<UIViewController> makeWorkouts(const Application& application) {
+  constexpr std::size_t listed = 12;
+  const auto controller = makeController<WorkoutsListController>();
+  controller->setWorkouts(latestWorkouts(application.diary(), listed));
+  return controller;
+}
+
+Ref<UIViewController> makeWorkout(const Application& application) {
+  const auto controller = makeController<WorkoutDetailController>();
+  const std::vector<const Workout*> latest = latestWorkouts(application.diary(), 1);
+  controller->setWorkout(latest.empty() ? nullptr : latest.front());
+  return controller;
+}
+
 struct Screen {
   std::string_view name;
   Ref<UIViewController> (*make)(const Application&);
 };
 
-constexpr Screen kScreens[] = {{"day", &makeDay}};
+constexpr Screen kScreens[] = {
+    {"day", &makeDay},
+    {"workouts", &makeWorkouts},
+    {"workout", &makeWorkout},
+};
 
 }  // namespace
 
