@@ -14,13 +14,14 @@ constexpr std::size_t kRangesOfPace = 3;
 /// Minutes, an apostrophe, at most one blank, seconds, then two apostrophes or one quote. Digits of
 /// every script count as minutes, seconds are ASCII.
 ///
-/// A run of digits is tried as a whole and from its beginning only: it cannot match otherwise, and
-/// a label of nothing but digits then costs one look at each instead of one at each pair.
+/// A run of digits is tried from its beginning only: it cannot match otherwise, and a label of
+/// nothing but digits then costs one look at each instead of one at each pair. Digits after the
+/// first are a set, which the engine repeats without remembering each.
 const NSRegularExpression& pacePattern() {
   static OnceToken token;
   static Ref<NSRegularExpression> pattern;
   dispatchOnce(
-      token, [] { pattern = regularExpression(R"re((?<!\d)(\d++)'\s?([0-5]?[0-9])(?:''|"))re"); });
+      token, [] { pattern = regularExpression(R"re((?<!\d)(\d[\d]*)'\s?([0-5]?[0-9])(?:''|"))re"); });
   return *pattern;
 }
 
