@@ -20,8 +20,9 @@ constexpr std::size_t kRangesOfPace = 3;
 const NSRegularExpression& pacePattern() {
   static OnceToken token;
   static Ref<NSRegularExpression> pattern;
-  dispatchOnce(
-      token, [] { pattern = regularExpression(R"re((?<!\d)(\d[\d]*)'\s?([0-5]?[0-9])(?:''|"))re"); });
+  dispatchOnce(token, [] {
+    pattern = regularExpression(R"re((?<!\d)(\d[\d]*)'\s?([0-5]?[0-9])(?:''|"))re");
+  });
   return *pattern;
 }
 
