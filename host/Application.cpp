@@ -11,6 +11,9 @@
 #include "host/screens/trends/TrendControllers.h"
 #include "host/screens/workouts/NoHeartRateData.h"
 #include "host/screens/workouts/WorkoutRowScreens.h"
+#include "host/screens/workouts/WorkoutDetailController.h"
+#include "host/screens/workouts/WorkoutRecords.h"
+#include "host/screens/workouts/WorkoutsListController.h"
 #include "platform/foundation/NSDate.h"
 
 namespace tavro {
@@ -34,6 +37,17 @@ Ref<UIViewController> makeTrend(const Application& application) {
   const auto controller = makeController<TrendDetailViewController>();
   const std::vector<Trend>& trends = application.diary().trends;
   controller->setTrend(trends.empty() ? nullptr : &trends.front());
+Ref<UIViewController> makeWorkouts(const Application& application) {
+  constexpr std::size_t listed = 12;
+  const auto controller = makeController<WorkoutsListController>();
+  controller->setWorkouts(latestWorkouts(application.diary(), listed));
+  return controller;
+}
+
+Ref<UIViewController> makeWorkout(const Application& application) {
+  const auto controller = makeController<WorkoutDetailController>();
+  const std::vector<const Workout*> latest = latestWorkouts(application.diary(), 1);
+  controller->setWorkout(latest.empty() ? nullptr : latest.front());
   return controller;
 }
 
@@ -52,6 +66,8 @@ constexpr Screen kScreens[] = {
     {"heart-rate", &makeHeartRate},
     {"map", &makeMap},
     {"no-heart-rate", &makeNoHeartRateData},
+    {"workouts", &makeWorkouts},
+    {"workout", &makeWorkout},
 };
 
 }  // namespace

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/foundation/NSAttributedString.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/NSString.h"
 #include "platform/healthkit/HKUnit.h"
@@ -40,6 +41,13 @@ tavro::Ref<tavro::NSString> accessibilityTavroStringForDate(const tavro::Ref<tav
 /// as a goal completed, and three of them as all goals completed.
 tavro::Ref<tavro::NSString> accessibilityDescriptionForPercentages(double move, double exercise,
                                                                    double stand, bool isCapped);
+
+/// A label's text, given as a string or an attributed string, with its first pace (8'05'') replaced
+/// by its whole seconds and those marked as a duration of minutes and seconds. The text for "no
+/// data" when a dash placeholder is anywhere in it; the text as it is when it holds no pace; nil
+/// for nil and for an empty text. Attributes of the text itself are not kept.
+tavro::Ref<tavro::AXAttributedString> accessibilityAttributedStringForPaceContainingString(
+    const tavro::id& text);
 
 }  // extern "C"
 
