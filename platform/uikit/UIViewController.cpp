@@ -132,7 +132,8 @@ UIWindow::~UIWindow() {
 void UIWindow::makeKey() { keyWindowOfProcess = this; }
 
 void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
-  for (const id& view : *subviews()) {
+  const Ref<NSArray> earlier = subviews();
+  for (const id& view : *earlier) {
     as<UIView>(view)->removeFromSuperview();
   }
   controller_ = controller;
