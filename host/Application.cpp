@@ -6,7 +6,13 @@
 #include "host/Dates.h"
 #include "host/libraries/Achievements.h"
 #include "host/libraries/ActivitySummaryCache.h"
+#include "host/screens/achievements/AchievementDetailViewController.h"
+#include "host/screens/achievements/AchievementsViewController.h"
 #include "host/screens/day/DayViewController.h"
+#include "host/screens/goals/GoalSetupViewController.h"
+#include "host/screens/sharing/FriendDetailViewController.h"
+#include "host/screens/sharing/FriendInboxViewController.h"
+#include "host/screens/sharing/FriendListViewController.h"
 #include "platform/foundation/NSDate.h"
 
 namespace tavro {
@@ -25,7 +31,15 @@ struct Screen {
   Ref<UIViewController> (*make)(const Application&);
 };
 
-constexpr Screen kScreens[] = {{"day", &makeDay}};
+constexpr Screen kScreens[] = {
+    {"day", &makeDay},
+    {"friends", &makeFriendList},
+    {"friend", &makeFriendDetail},
+    {"inbox", &makeFriendInbox},
+    {"achievements", &makeAchievements},
+    {"achievement", &makeAchievementDetail},
+    {"goals", &makeGoalSetup},
+};
 
 }  // namespace
 
