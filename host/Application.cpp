@@ -14,6 +14,13 @@
 #include "host/screens/workouts/WorkoutDetailController.h"
 #include "host/screens/workouts/WorkoutRecords.h"
 #include "host/screens/workouts/WorkoutsListController.h"
+#include "host/screens/achievements/AchievementDetailViewController.h"
+#include "host/screens/achievements/AchievementsViewController.h"
+#include "host/screens/day/DayViewController.h"
+#include "host/screens/goals/GoalSetupViewController.h"
+#include "host/screens/sharing/FriendDetailViewController.h"
+#include "host/screens/sharing/FriendInboxViewController.h"
+#include "host/screens/sharing/FriendListViewController.h"
 #include "platform/foundation/NSDate.h"
 
 namespace tavro {
@@ -68,6 +75,12 @@ constexpr Screen kScreens[] = {
     {"no-heart-rate", &makeNoHeartRateData},
     {"workouts", &makeWorkouts},
     {"workout", &makeWorkout},
+    {"friends", &makeFriendList},
+    {"friend", &makeFriendDetail},
+    {"inbox", &makeFriendInbox},
+    {"achievements", &makeAchievements},
+    {"achievement", &makeAchievementDetail},
+    {"goals", &makeGoalSetup},
 };
 
 }  // namespace
