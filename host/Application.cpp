@@ -10,13 +10,11 @@
 #include "host/screens/day/DayViewController.h"
 #include "host/screens/trends/TrendControllers.h"
 #include "host/screens/workouts/NoHeartRateData.h"
-#include "host/screens/workouts/WorkoutRowScreens.h"
 #include "host/screens/workouts/WorkoutDetailController.h"
 #include "host/screens/workouts/WorkoutRecords.h"
 #include "host/screens/workouts/WorkoutsListController.h"
 #include "host/screens/achievements/AchievementDetailViewController.h"
 #include "host/screens/achievements/AchievementsViewController.h"
-#include "host/screens/day/DayViewController.h"
 #include "host/screens/goals/GoalSetupViewController.h"
 #include "host/screens/sharing/FriendDetailViewController.h"
 #include "host/screens/sharing/FriendInboxViewController.h"
@@ -44,6 +42,9 @@ Ref<UIViewController> makeTrend(const Application& application) {
   const auto controller = makeController<TrendDetailViewController>();
   const std::vector<Trend>& trends = application.diary().trends;
   controller->setTrend(trends.empty() ? nullptr : &trends.front());
+  return controller;
+}
+
 Ref<UIViewController> makeWorkouts(const Application& application) {
   constexpr std::size_t listed = 12;
   const auto controller = makeController<WorkoutsListController>();
@@ -66,15 +67,13 @@ struct Screen {
 constexpr Screen kScreens[] = {
     {"day", &makeDay},
     {"week", &makeWeek},
-    {"loading", &makeLoadingCalendar},
     {"calendar", &makeCalendar},
-    {"trends", &makeTrends},
-    {"trend", &makeTrend},
-    {"heart-rate", &makeHeartRate},
-    {"map", &makeMap},
-    {"no-heart-rate", &makeNoHeartRateData},
+    {"loading", &makeLoadingCalendar},
     {"workouts", &makeWorkouts},
     {"workout", &makeWorkout},
+    {"no-heart-rate", &makeNoHeartRateData},
+    {"trends", &makeTrends},
+    {"trend", &makeTrend},
     {"friends", &makeFriendList},
     {"friend", &makeFriendDetail},
     {"inbox", &makeFriendInbox},

@@ -273,17 +273,4 @@ Diary Diary::read(const std::string& path) {
   return diary;
 }
 
-const Workout* Diary::latestWorkout() const {
-  const Workout* latest = nullptr;
-  double latestStart = 0;
-  for (const Workout& workout : workouts) {
-    const double start = secondsFromIso(workout.start.iso).value_or(0);
-    if (workout.isImported || latest == nullptr || (!latest->isImported && start > latestStart)) {
-      latest = &workout;
-      latestStart = start;
-    }
-  }
-  return latest;
-}
-
 }  // namespace tavro

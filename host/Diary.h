@@ -191,10 +191,6 @@ struct Diary {
   /// Reads and checks a file. Throws a `FileError` whose one sentence names the file, the place in
   /// it ("days[12].exercise", or line and column where it is not JSON) and the reason.
   static Diary read(const std::string& path);
-
-  /// The workout that started last, or the imported one that was added last, whenever it was: it is
-  /// what the person wants to hear of. nullptr when there is none. Read in the settings' time zone.
-  [[nodiscard]] const Workout* latestWorkout() const;
 };
 
 }  // namespace tavro

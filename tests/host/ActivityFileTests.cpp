@@ -4,6 +4,9 @@
 #include <fstream>
 
 #include "host/ActivityFile.h"
+#include "host/screens/workouts/WorkoutRecords.h"
+#include "platform/foundation/NSDate.h"
+#include "platform/foundation/Settings.h"
 #include "platform/foundation/NSBundle.h"
 
 namespace tavro {
@@ -255,18 +258,20 @@ TEST(ActivityFile, FilesThatCannotBeRead) {
 }
 
 TEST(ActivityFile, WhatIsImportedIsTheLatestWorkout) {
+  Settings::current().now = secondsFromIso("2026-03-11T15:20Z").value();
   Diary diary;
-  EXPECT_EQ(diary.latestWorkout(), nullptr);
-  diary.workouts.resize(3);
-  diary.workouts[0].start.iso = "2026-03-10T07:00";
-  diary.workouts[1].start.iso = "2026-03-11T07:00";
-  diary.workouts[2].start.iso = "2026-03-09T07:00";
-  EXPECT_EQ(diary.latestWorkout(), &diary.workouts[1]) << "they stand in any order";
-  Workout old;
-  old.start.iso = "2020-01-01T07:00Z";
-  old.isImported = true;
-  diary.workouts.insert(diary.workouts.begin(), old);
-  EXPECT_EQ(diary.latestWorkout(), diary.workouts.data()) << "whenever it was";
+  EXPECT_TRUE(latestWorkouts(diary, 1).empty());
+  diary.workouts.resize(4);
+  diary.workouts[0].start.iso = "2026-03-10T07:00Z";
+  diary.workouts[1].start.iso = "2026-03-11T07:00Z";
+  diary.workouts[2].start.iso = "2026-03-12T07:00Z";  // has not begun yet
+  diary.workouts[3].start.iso = "2026-03-09T07:00Z";
+  const std::vector<const Workout*> byStart{&diary.workouts[1], &diary.workouts[0],
+                                            &diary.workouts[3]};
+  EXPECT_EQ(latestWorkouts(diary, 9), byStart);
+  diary.workouts[3].start.iso = "2020-01-01T07:00Z";
+  diary.workouts[3].isImported = true;
+  EXPECT_EQ(latestWorkouts(diary, 1).front(), &diary.workouts[3]) << "whenever it was";
 }
 
 }  // namespace

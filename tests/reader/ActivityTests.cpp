@@ -18,14 +18,14 @@ SessionOptions optionsWith(const std::string& activity) {
 
 TEST(Activity, IsReadAsTheLatestWorkout) {
   Session session(optionsWith(TAVRO_SOURCE "/tests/data/loop.gpx"));
+  const std::string heard = transcript(session.read("workout"));
   // The file says UTC; the person of the diary lives in New York.
-  EXPECT_TRUE(transcript(session.read("heart-rate"))
-                  .starts_with("Workout Heart Rate, heading\nHeart Rate\n"
-                               "2:00\u2009–\u20092:02\u202fAM, 90 beats per minute\n"
-                               "2:02\u2009–\u20092:05\u202fAM\n"))
-      << transcript(session.read("heart-rate"));
-  EXPECT_EQ(transcript(session.read("map")),
-            "Workout Map, heading\nLake loop, button, Shows the route on a larger map\n");
+  EXPECT_NE(heard.find("2:00\u2009–\u20092:02\u202fAM, 90 beats per minute\n"
+                       "2:02\u2009–\u20092:05\u202fAM\n"),
+            std::string::npos)
+      << heard;
+  EXPECT_NE(heard.find("\nLake loop, button, Shows the route on a larger map\n"), std::string::npos)
+      << heard;
 }
 
 TEST(Activity, ABrokenFileIsAnError) {

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "host/screens/workouts/HeartRateChart.h"
+#include "host/screens/workouts/MapAndWeather.h"
 #include "host/screens/workouts/WorkoutDetailCells.h"
 #include "host/screens/workouts/WorkoutRecords.h"
 
@@ -84,11 +86,23 @@ void appendSplits(UITableView& table, const WorkoutDetail& detail) {
   }
 }
 
+void appendHeartRate(UITableView& table, const WorkoutDetail& detail) {
+  table.appendRow(heartRateRow(detail.entry), CHWorkoutDetailHeartRateChartTableViewCell::height);
+}
+
+void appendMapAndWeather(UITableView& table, const WorkoutDetail& detail) {
+  if (const Ref<UIView> row = mapAndWeatherRow(detail.entry)) {
+    table.appendRow(row, CHWorkoutDetailMapAndWeatherTableViewCell::height);
+  }
+}
+
 /// From top to bottom.
 constexpr WorkoutDetailSection kSections[] = {
     &appendTotals,
     &appendPace,
     &appendSplits,
+    &appendHeartRate,
+    &appendMapAndWeather,
 };
 
 }  // namespace

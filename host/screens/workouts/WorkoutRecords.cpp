@@ -1,6 +1,7 @@
 #include "host/screens/workouts/WorkoutRecords.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "platform/foundation/NSDate.h"
 
@@ -13,17 +14,18 @@ double startOf(const Workout& workout) { return secondsFromIso(workout.start.iso
 
 std::vector<const Workout*> latestWorkouts(const Diary& diary, std::size_t most) {
   struct Started {
-    double seconds;
+    std::pair<bool, double> rank;  // imported first, then by the moment of its start
     const Workout* workout;
   };
   const double now = dateNow()->seconds;
   std::vector<Started> started;
   for (const Workout& workout : diary.workouts) {
-    if (const double seconds = startOf(workout); seconds <= now) {
-      started.push_back({seconds, &workout});
+    const double seconds = startOf(workout);
+    if (workout.isImported || seconds <= now) {
+      started.push_back({{workout.isImported, seconds}, &workout});
     }
   }
-  std::ranges::stable_sort(started, std::ranges::greater(), &Started::seconds);
+  std::ranges::stable_sort(started, std::ranges::greater(), &Started::rank);
   started.resize(std::min(most, started.size()));
   std::vector<const Workout*> workouts;
   std::ranges::transform(started, std::back_inserter(workouts), &Started::workout);
@@ -66,6 +68,8 @@ std::string_view activityName(HKWorkoutActivityType type) {
       return "Outdoor Walk";
     case HKWorkoutActivityType::yoga:
       return "Yoga";
+    case HKWorkoutActivityType::other:
+      break;
   }
   return "Workout";
 }

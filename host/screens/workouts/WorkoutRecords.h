@@ -5,7 +5,8 @@
 
 namespace tavro {
 
-/// The workouts that had begun by the settings' present moment, latest first, at most that many.
+/// The workouts that had begun by the settings' present moment, latest first, at most that many. An
+/// imported one comes before all others, whenever it was: it is what the person wants to hear of.
 /// They belong to the diary.
 std::vector<const Workout*> latestWorkouts(const Diary& diary, std::size_t most);
 
