@@ -19,9 +19,8 @@ const Registered groupClass = defineClass<Group, UIAccessibilityAggregateElement
 
 id AXGroupedTitleValueView::initWithAccessibilityContainer(const id& container, const id& titleView,
                                                            const id& valueView) {
-  const id element =
-      send<id>(this, "initWithAccessibilityContainer:representedElements:", container,
-               axArrayByIgnoringNilElements({titleView, valueView}));
+  id element = send<id>(this, "initWithAccessibilityContainer:representedElements:", container,
+                        axArrayByIgnoringNilElements({titleView, valueView}));
   if (element) {
     _titleView = titleView;
     _valueView = valueView;

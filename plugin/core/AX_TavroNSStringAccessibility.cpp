@@ -12,7 +12,7 @@ class AX_TavroNSStringAccessibility : public SafeCategory {
   static constexpr Name target = "NSString";
 
   id attrStringWithValueUnit(const id& value, const id& unit) {
-    const id shown = super.send<id>(value, unit);
+    id shown = super.send<id>(value, unit);
     if (const id spokenUnit = accessibilityLabelOf(unit)) {
       AXPerformSafeBlock(
           [&] { send<void>(shown, "setAccessibilityLabel:", super.send<id>(value, spokenUnit)); });

@@ -19,10 +19,10 @@ void loadGraphData(Object* chart, Name key, Name firstObjectClass, Name retained
 /// the build gets the same list, and then filled by `build(list)`.
 template <class Build>
 id elementsBuiltOnce(Object* chart, std::size_t capacity, const Build& build) {
-  if (const id built = _accessibilityValueForKey(chart, kUIAccessibilityStorageKeyChildren)) {
+  if (id built = _accessibilityValueForKey(chart, kUIAccessibilityStorageKeyChildren)) {
     return built;
   }
-  const Ref<NSMutableArray> elements = mutableArray(capacity);
+  Ref<NSMutableArray> elements = mutableArray(capacity);
   _accessibilitySetRetainedValue(chart, elements, kUIAccessibilityStorageKeyChildren);
   build(*elements);
   _accessibilitySetRetainedValue(chart, elements, kUIAccessibilityStorageKeyChildren);

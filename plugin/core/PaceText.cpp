@@ -59,7 +59,7 @@ Ref<AXAttributedString> accessibilityAttributedStringForPaceContainingString(con
       make<NSNumberFormatter>()->stringFromNumber(number(std::int64_t{total}));
   std::u16string spoken(text->text());
   spoken.replace(whole.location, whole.length, formatted ? formatted->text() : u"");
-  const Ref<AXAttributedString> pace = axAttributedString(string(spoken));
+  Ref<AXAttributedString> pace = axAttributedString(string(spoken));
   pace->setAttribute(kCFBooleanTrue(), UIAccessibilityTokenDurationTimeMMSS,
                      {whole.location, lengthOfText(formatted)});
   return pace;

@@ -14,7 +14,7 @@ class CHWorkoutFormattingManagerAccessibility : public SafeCategory {
   static constexpr Name target = "CHWorkoutFormattingManager";
 
   id formattedDuration(const id& workout, const id& activity, const id& context) {
-    const id shown = super.send<id>(workout, activity, context);
+    id shown = super.send<id>(workout, activity, context);
     if (const auto duration = as<NSAttributedString>(shown); lengthOfText(duration) > 0) {
       const Ref<AXAttributedString> spoken = axAttributedString(plainText(duration));
       spoken->setAttribute(kCFBooleanTrue(), UIAccessibilityTokenDurationTimeHHMMSS);
