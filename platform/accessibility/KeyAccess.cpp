@@ -46,9 +46,19 @@ void insert(KeyTable& table, const Access& access) {
   ++table.used;
 }
 
-bool isAccessor(const Method* method) {
-  return method != nullptr && method->signature.encodings.find(',') == std::string_view::npos &&
+/// Class objects inherit the root class's methods too, but answer keys through class methods alone.
+bool isAccessor(const Method* method, const Class* isa) {
+  return method != nullptr && method->owner->isMetaclass() == isa->isMetaclass() &&
+         method->signature.encodings.find(',') == std::string_view::npos &&
          method->signature.encodings != "v";
+}
+
+/// What `Access::kind` says of a variable; a block cannot be read as a value.
+char kindOf(const InstanceVariable& variable) {
+  if (variable.isObject) {
+    return '@';
+  }
+  return variable.type.starts_with("@?") ? '\0' : variable.type.front();
 }
 
 /// Decides how a key is read; the order of the candidates is the promise of safe key access.
@@ -63,7 +73,7 @@ Access resolve(Class* isa, Name key) {
       text[0] >= 'a' && text[0] <= 'z' ? static_cast<char>(text[0] - 'a' + 'A') : text[0];
   const Name underscored = Name::make("_" + text);
   for (const Name accessor : {key, Name::make("is" + capitalized), underscored}) {
-    if (const Method* const method = isa->method(accessor); isAccessor(method)) {
+    if (const Method* const method = isa->method(accessor); isAccessor(method, isa)) {
       access.accessor = method;
       access.kind = method->signature.encodings.front();
       return access;
@@ -73,7 +83,7 @@ Access resolve(Class* isa, Name key) {
     for (const Name name : {underscored, key}) {
       if (const InstanceVariable* const variable = isa->variable(name)) {
         access.variable = variable;
-        access.kind = variable->isObject ? '@' : variable->type.front();
+        access.kind = kindOf(*variable);
         return access;
       }
     }
@@ -111,6 +121,7 @@ const Access& accessFor(Class* isa, Name key) {
       return *known;
     }
   }
+  const auto lock = lockClassTables();
   return remember(isa, resolve(isa, key));
 }
 

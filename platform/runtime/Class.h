@@ -2,6 +2,7 @@
 
 #include <atomic>
 #include <deque>
+#include <mutex>
 #include <span>
 #include <string>
 #include <string_view>
@@ -28,6 +29,9 @@ struct Method {
   const Method* replaced = nullptr;
   /// The class that this method was grafted from, or nullptr for a method of the class itself.
   Class* graftedFrom = nullptr;
+  /// True when the code runs for any receiver. Class objects inherit the root class's methods of
+  /// this kind alone: code for a native type would take them for instances of it.
+  bool takesAnyReceiver = false;
 };
 
 /// A variable of every instance, readable by name.
@@ -158,6 +162,9 @@ class Class final : public Object {
   std::atomic<const KeyTable*> keyTable_{nullptr};
 };
 
+/// Keeps class tables from changing; for what is built of them and kept beside them.
+[[nodiscard]] std::unique_lock<std::recursive_mutex> lockClassTables();
+
 /// A declaration that could not be carried out.
 struct RegistrationProblem {
   std::string className;
@@ -183,10 +190,12 @@ class ImageScope {
   ImageScope& operator=(const ImageScope&) = delete;
 };
 
-/// True when the object is nil-safe an instance of that class or of a subclass of it.
+/// True when the object is an instance of that class or of a subclass of it; nil is not. A class
+/// object is no instance of the root class, although it inherits from it.
 inline bool isKindOf(const Object* object, const Class* isa) {
   return object != nullptr && isa != nullptr &&
-         (object->isa() == isa || object->isa()->isSubclassOf(isa));
+         (object->isa() == isa ||
+          (object->isa()->isSubclassOf(isa) && object->isa()->isMetaclass() == isa->isMetaclass()));
 }
 
 /// The class that a native type stands for, or nullptr when it is not loaded.

@@ -54,7 +54,7 @@ decltype(auto) receive(TravelArgument<T> argument) {
     return Value(argument);
   } else if constexpr (kIsReference<Value> ||
                        (kIsObjectPointer<Value> && !std::is_same_v<Value, Class*>)) {
-    using Target = std::remove_pointer_t<decltype(std::declval<Value>().operator->())>;
+    using Target = std::remove_reference_t<decltype(*std::declval<Value>())>;
     if (argument != nullptr && !isKindOf(argument, classOf<Target>())) {
       raiseWrongClass(argument, Target::className);
     }
@@ -131,7 +131,8 @@ class Super {
 
   template <class R, class... A>
   R send(const A&... arguments) const {
-    if (const Method* const replaced = running_->replaced) {
+    const Method* const replaced = running_->replaced;
+    if (replaced != nullptr && replaced->implementation != nullptr) {  // not taken away since
       const DispatchTable::Slot slot{replaced->selector.hash(), replaced->signature.hash,
                                      replaced->implementation, replaced};
       return message::invoke<R>(receiver_, &slot, replaced->selector, arguments...);
@@ -159,6 +160,7 @@ struct Binder;
 template <auto F, class T, class R, class... A>
 struct MemberBinder {
   static constexpr tavro::Signature signature = kSignature<TravelResult<R>, TravelArgument<A>...>;
+  static constexpr bool takesAnyReceiver = Facade<T>;
 
   static TravelResult<R> call(Object* receiver, const Method& running,
                               TravelArgument<A>... arguments) {
@@ -181,6 +183,7 @@ struct Binder<F, R (T::*)(A...) const> : MemberBinder<F, T, R, A...> {};
 template <auto F, class Receiver, class R, class... A>
 struct Binder<F, R (*)(Receiver*, A...)> {
   static constexpr tavro::Signature signature = kSignature<TravelResult<R>, TravelArgument<A>...>;
+  static constexpr bool takesAnyReceiver = std::is_same_v<Receiver, Object>;
 
   static TravelResult<R> call(Object* receiver, const Method& /*running*/,
                               TravelArgument<A>... arguments) {
@@ -197,7 +200,8 @@ Method methodOf(Name selector) {
   using Code = message::Binder<F>;
   return {.selector = selector,
           .signature = Code::signature,
-          .implementation = reinterpret_cast<Implementation>(&Code::call)};
+          .implementation = reinterpret_cast<Implementation>(&Code::call),
+          .takesAnyReceiver = Code::takesAnyReceiver};
 }
 
 /// Builds a class declaration from a native type:
@@ -264,6 +268,9 @@ ClassBuilder defineClass() {
   ClassDeclaration declaration{.name = T::className, .superclass = Superclass::className};
   if constexpr (std::is_default_constructible_v<T>) {
     declaration.create = []() -> Object* { return new T; };
+  } else {
+    // Not what the superclass would make: T's methods need a T.
+    declaration.create = []() -> Object* { return nullptr; };
   }
   return ClassBuilder(std::move(declaration));
 }

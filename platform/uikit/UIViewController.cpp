@@ -129,11 +129,16 @@ UIWindow::~UIWindow() {
   }
 }
 
-void UIWindow::makeKey() { keyWindowOfProcess = this; }
+void UIWindow::makeKey() {
+  keyWindowOfProcess = this;
+  layoutIfNeeded();
+  loadAccessibilityInformation(*this);
+}
 
 void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
-  for (const id& view : *subviews()) {
-    as<UIView>(view)->removeFromSuperview();
+  const std::vector<Ref<UIView>> shown = subviewList();
+  for (const Ref<UIView>& view : shown) {
+    view->removeFromSuperview();
   }
   controller_ = controller;
   if (!controller) {
@@ -149,6 +154,7 @@ void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
     bar->setItem(item);
     addSubview(bar);
   }
+  forgetAccessibilityInformation(*content);  // a screen that comes back is annotated anew
   content->setFrame({0, top, size.width, size.height - top});
   addSubview(content);
   UIAccessibilityPostNotification(UIAccessibilityScreenChangedNotification, nullptr);
