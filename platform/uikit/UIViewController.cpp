@@ -149,12 +149,14 @@ void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
   const bool hasBar = item->title || !item->leftItems.empty() || !item->rightItems.empty();
   const CGSize size = frame().size;
   const double top = hasBar ? navigationBarHeight : 0;
+  // A screen that comes back is annotated anew, its bar's views too.
+  forgetAccessibilityInformation(*content);
   if (hasBar) {
     const auto bar = makeView<UINavigationBar>({0, 0, size.width, top});
     bar->setItem(item);
+    forgetAccessibilityInformation(*bar);
     addSubview(bar);
   }
-  forgetAccessibilityInformation(*content);  // a screen that comes back is annotated anew
   content->setFrame({0, top, size.width, size.height - top});
   addSubview(content);
   UIAccessibilityPostNotification(UIAccessibilityScreenChangedNotification, nullptr);

@@ -188,9 +188,9 @@ TEST(FrameTests, FramesInContainerSpaceFollowTheirContainer) {
   EXPECT_EQ(frameOf(nested), CGRect(11, -78, 3, 4)) << "the nearest view is the space";
   send<void>(element, "setAccessibilityFrame:", CGRect(7, 7, 7, 7));
   EXPECT_EQ(frameOf(element), CGRect(7, 7, 7, 7)) << "what was set last counts";
-  EXPECT_EQ(send<CGPoint>(element, "accessibilityActivationPoint"), CGPoint(10.5, 10.5));
+  EXPECT_EQ(send<CGPoint>(element, "accessibilityActivationPoint"), (CGPoint{10.5, 10.5}));
   send<void>(element, "setAccessibilityActivationPoint:", CGPoint{1, 1});
-  EXPECT_EQ(send<CGPoint>(element, "accessibilityActivationPoint"), CGPoint(1, 1));
+  EXPECT_EQ(send<CGPoint>(element, "accessibilityActivationPoint"), (CGPoint{1, 1}));
 }
 
 TEST(FrameTests, LayersFollowTheirViewsAndSuperlayers) {

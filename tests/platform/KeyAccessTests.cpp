@@ -143,8 +143,8 @@ TEST_F(KeyAccessTests, PrimitivesArriveBoxedFromVariablesAndAccessors) {
     EXPECT_EQ(send<std::int32_t>(boxed("narrow"), "intValue"), -6);
     EXPECT_EQ(send<double>(boxed("ratio"), "doubleValue"), 0.25);
     EXPECT_EQ(send<float>(boxed("share"), "floatValue"), 0.5F);
-    EXPECT_EQ(send<CGPoint>(boxed("point"), "CGPointValue"), CGPoint(1, 2));
-    EXPECT_EQ(send<CGSize>(boxed("extent"), "CGSizeValue"), CGSize(3, 4));
+    EXPECT_EQ(send<CGPoint>(boxed("point"), "CGPointValue"), (CGPoint{1, 2}));
+    EXPECT_EQ(send<CGSize>(boxed("extent"), "CGSizeValue"), (CGSize{3, 4}));
     EXPECT_EQ(send<CGRect>(boxed("frame"), "CGRectValue"), CGRect(1, 2, 3, 4));
     EXPECT_EQ(boxed("kind"), id(classOf<NSString>()));
     EXPECT_FALSE(boxed("selector")) << "a selector has no box";

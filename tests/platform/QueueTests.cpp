@@ -57,6 +57,7 @@ TEST(GlobalQueueTests, WorkMayQueueMoreEvenAsItGoes) {
   std::atomic<int> done = 0;
   /// Queues work when the work that holds it is destroyed.
   struct Farewell {
+    explicit Farewell(std::atomic<int>* counter) : done(counter) {}
     std::atomic<int>* done;
     ~Farewell() {
       GlobalQueue::shared().async([done = done] { ++*done; });
