@@ -129,7 +129,11 @@ UIWindow::~UIWindow() {
   }
 }
 
-void UIWindow::makeKey() { keyWindowOfProcess = this; }
+void UIWindow::makeKey() {
+  keyWindowOfProcess = this;
+  layoutIfNeeded();
+  loadAccessibilityInformation(*this);
+}
 
 void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
   const std::vector<Ref<UIView>> shown = subviewList();
@@ -145,9 +149,12 @@ void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
   const bool hasBar = item->title || !item->leftItems.empty() || !item->rightItems.empty();
   const CGSize size = frame().size;
   const double top = hasBar ? navigationBarHeight : 0;
+  // A screen that comes back is annotated anew, its bar's views too.
+  forgetAccessibilityInformation(*content);
   if (hasBar) {
     const auto bar = makeView<UINavigationBar>({0, 0, size.width, top});
     bar->setItem(item);
+    forgetAccessibilityInformation(*bar);
     addSubview(bar);
   }
   content->setFrame({0, top, size.width, size.height - top});
