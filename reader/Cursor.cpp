@@ -96,18 +96,15 @@ bool Cursor::seekAudible(std::ptrdiff_t start, std::ptrdiff_t step) {
 
 bool Cursor::move(Move move) {
   const auto here = static_cast<std::ptrdiff_t>(index_);
-  const auto isAudibleHeading = [](const HeardElement& element) {
-    return isHeading(element) && isAudible(element);
-  };
   switch (move) {
     case Move::next:
       return seekAudible(here + 1, 1);
     case Move::previous:
       return seekAudible(here - 1, -1);
     case Move::nextHeading:
-      return seek(here + 1, 1, isAudibleHeading);
+      return seek(here + 1, 1, &isHeading);
     case Move::previousHeading:
-      return seek(here - 1, -1, isAudibleHeading);
+      return seek(here - 1, -1, &isHeading);
     case Move::first:
       return seekAudible(0, 1);
     case Move::last:

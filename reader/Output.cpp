@@ -106,7 +106,7 @@ std::string transcript(const std::vector<HeardElement>& elements, Verbosity verb
 std::string headings(const std::vector<HeardElement>& elements) {
   std::string text;
   for (const HeardElement& element : elements) {
-    text += isHeading(element) && !element.utterance.empty() ? element.utterance + "\n" : "";
+    text += isHeading(element) ? element.utterance + "\n" : "";
   }
   return text;
 }
