@@ -47,7 +47,7 @@ struct Place {
   }
 
   void find(const Command& command) {
-    if (!cursor->find(command.label)) {
+    if (command.label.empty() || !cursor->find(command.label)) {
       refuse("no element of " + quoted(command.screen) + " begins with " + quoted(command.label));
     }
   }

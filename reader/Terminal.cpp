@@ -58,6 +58,10 @@ int keyOfFinalByte(unsigned char byte) {
 
 Terminal::Terminal() {
   caughtSignal = 0;
+  if (fcntl(STDIN_FILENO, F_GETFD) == -1) {
+    // Without a standard input there are no keys, and nothing else may take its number.
+    [[maybe_unused]] const int nothing = open("/dev/null", O_RDONLY);
+  }
   if (pipe2(wakingPipe, O_CLOEXEC | O_NONBLOCK) != 0) {
     throw std::system_error(errno, std::generic_category(), "the keyboard cannot be waited for");
   }

@@ -30,7 +30,9 @@ bool isInPath(const std::string& program) {
   return false;
 }
 
-std::string languageOf(const std::string& locale) { return locale.substr(0, locale.find('_')); }
+std::string languageOf(const std::string& locale) {
+  return locale.substr(0, locale.find_first_of("_-"));
+}
 
 /// The program neither reads the reader's keys nor writes between its lines.
 class QuietFiles {

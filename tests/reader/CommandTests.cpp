@@ -55,6 +55,7 @@ TEST(Narrel, RefusesWrongArgumentsWithOneSentence) {
       {{"touch", "day", "--at", "nan,1"}, "\"nan,1\" is not a point"},
       {{"touch", "day", "--at", "5,5000"}, "nothing can be heard at 5,5000 on \"day\""},
       {{"activate", "day"}, "LABEL is missing"},
+      {{"activate", "day", ""}, "no element of \"day\" begins with \"\""},
       {{"activate", "day", "Swim"}, "no element of \"day\" begins with \"Swim\""},
       {{"activate", "day", "TOTAL"}, "does nothing when it is activated"},
       {{"adjust", "day", "Move"}, "needs either --up or --down"},
