@@ -14,6 +14,7 @@ class ContainerTest : public testing::Test {
  protected:
   void SetUp() override {
     setReaderResources(std::string(TAVRO_SOURCE) + "/reader/resources");
+    Settings::current().locale = "en_US";
     send<void>(chart, "setAccessibilityLabel:", string("Steps"));
     fill(chart, {"Mon", "Tue", "Wed"});
     fill(alone, {"Only"});

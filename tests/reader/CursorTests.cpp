@@ -2,6 +2,7 @@
 
 #include <stdexcept>
 
+#include "platform/foundation/Settings.h"
 #include "platform/uikit/UITables.h"
 #include "platform/uikit/UIViewController.h"
 #include "reader/Cursor.h"
@@ -46,6 +47,7 @@ class CursorTest : public testing::Test {
  protected:
   void SetUp() override {
     setReaderResources(std::string(TAVRO_SOURCE) + "/reader/resources");
+    Settings::current().locale = "en_US";
     window->makeKey();
     window->addSubview(screen);
   }
@@ -324,6 +326,12 @@ TEST_F(CursorTest, ABarsItemsCanBeTouchedAndTapped) {
   EXPECT_EQ(taps, 1);
   EXPECT_TRUE(cursor.touch({10, 20}));
   EXPECT_FALSE(cursor.activate()) << "without a target";
+
+  Settings::current().locale = "ar_EG";
+  window->setRootViewController(controller);
+  cursor.update();
+  EXPECT_TRUE(cursor.touch({380, 20}));
+  EXPECT_EQ(here(cursor), "Back, button") << "a bar begins on the right";
 }
 
 TEST_F(CursorTest, ActivationReachesWhatTakesIt) {
