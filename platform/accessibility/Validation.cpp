@@ -124,15 +124,15 @@ void AXValidationManager::performValidations(const ChecksHandler& checks,
                                              const PostValidationHandler& after,
                                              const InstallationHandler& installation) {
   const bool runsChecks = before && before(this);
+  if (runsChecks && checks) {
+    currentCategory_.clear();
+    checks(this);
+  }
   const auto installer = tavro::make<AXSafeCategoryInstaller>();
   if (installation) {
     installation(installer);
   }
   if (runsChecks) {
-    currentCategory_.clear();
-    if (checks) {
-      checks(this);
-    }
     validateCategories(installer->categories);
   }
   for (const Name category : installer->categories) {

@@ -227,7 +227,7 @@ TEST_F(ValidationTests, TheHandlersRunInOrderAndMayBeMissing) {
              "performValidations:withPreValidationHandler:postValidationHandler:"
              "safeCategoryInstallationHandler:",
              ChecksHandler([&](const id&) {
-               order += "checks:" + textNow();
+               order += "checks:" + textNow() + " ";
                return false;
              }),
              PreValidationHandler([&](const id& passed) {
@@ -235,13 +235,13 @@ TEST_F(ValidationTests, TheHandlersRunInOrderAndMayBeMissing) {
                order += "before ";
                return true;
              }),
-             PostValidationHandler([&](const id&) { order += " after:" + textNow(); }),
+             PostValidationHandler([&](const id&) { order += "after:" + textNow(); }),
              InstallationHandler([&](const id& installer) {
                send<void>(installer, "installSafeCategory:canInteractWithTargetClass:",
                           string("GaugeTestAccessibility"), true);
                order += "naming:" + textNow() + " ";
              }));
-  EXPECT_EQ(order, "before naming:host checks:host after:host first");
+  EXPECT_EQ(order, "before checks:host naming:host after:host first");
   EXPECT_NO_THROW(manager->performValidations({}, {}, {}, {}));
   EXPECT_EQ(manager->report().installations.size(), 1U);
 }
