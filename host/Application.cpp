@@ -6,7 +6,19 @@
 #include "host/Dates.h"
 #include "host/libraries/Achievements.h"
 #include "host/libraries/ActivitySummaryCache.h"
+#include "host/screens/calendar/CalendarScreens.h"
 #include "host/screens/day/DayViewController.h"
+#include "host/screens/trends/TrendControllers.h"
+#include "host/screens/workouts/NoHeartRateData.h"
+#include "host/screens/workouts/WorkoutDetailController.h"
+#include "host/screens/workouts/WorkoutRecords.h"
+#include "host/screens/workouts/WorkoutsListController.h"
+#include "host/screens/achievements/AchievementDetailViewController.h"
+#include "host/screens/achievements/AchievementsViewController.h"
+#include "host/screens/goals/GoalSetupViewController.h"
+#include "host/screens/sharing/FriendDetailViewController.h"
+#include "host/screens/sharing/FriendInboxViewController.h"
+#include "host/screens/sharing/FriendListViewController.h"
 #include "platform/foundation/NSDate.h"
 
 namespace tavro {
@@ -20,12 +32,55 @@ Ref<UIViewController> makeDay(const Application& application) {
   return controller;
 }
 
+Ref<UIViewController> makeTrends(const Application& application) {
+  const auto controller = makeController<TrendsViewController>();
+  controller->setTrends(&application.diary().trends);
+  return controller;
+}
+
+Ref<UIViewController> makeTrend(const Application& application) {
+  const auto controller = makeController<TrendDetailViewController>();
+  const std::vector<Trend>& trends = application.diary().trends;
+  controller->setTrend(trends.empty() ? nullptr : &trends.front());
+  return controller;
+}
+
+Ref<UIViewController> makeWorkouts(const Application& application) {
+  constexpr std::size_t listed = 12;
+  const auto controller = makeController<WorkoutsListController>();
+  controller->setWorkouts(latestWorkouts(application.diary(), listed));
+  return controller;
+}
+
+Ref<UIViewController> makeWorkout(const Application& application) {
+  const auto controller = makeController<WorkoutDetailController>();
+  const std::vector<const Workout*> latest = latestWorkouts(application.diary(), 1);
+  controller->setWorkout(latest.empty() ? nullptr : latest.front());
+  return controller;
+}
+
 struct Screen {
   std::string_view name;
   Ref<UIViewController> (*make)(const Application&);
 };
 
-constexpr Screen kScreens[] = {{"day", &makeDay}};
+constexpr Screen kScreens[] = {
+    {"day", &makeDay},
+    {"week", &makeWeek},
+    {"calendar", &makeCalendar},
+    {"loading", &makeLoadingCalendar},
+    {"workouts", &makeWorkouts},
+    {"workout", &makeWorkout},
+    {"no-heart-rate", &makeNoHeartRateData},
+    {"trends", &makeTrends},
+    {"trend", &makeTrend},
+    {"friends", &makeFriendList},
+    {"friend", &makeFriendDetail},
+    {"inbox", &makeFriendInbox},
+    {"achievements", &makeAchievements},
+    {"achievement", &makeAchievementDetail},
+    {"goals", &makeGoalSetup},
+};
 
 }  // namespace
 

@@ -48,6 +48,7 @@ constexpr Choice<HKWorkoutActivityType> kWorkoutTypes[] = {
     {"cycling", HKWorkoutActivityType::cycling}, {"hiking", HKWorkoutActivityType::hiking},
     {"running", HKWorkoutActivityType::running}, {"swimming", HKWorkoutActivityType::swimming},
     {"walking", HKWorkoutActivityType::walking}, {"yoga", HKWorkoutActivityType::yoga},
+    {"other", HKWorkoutActivityType::other},
 };
 constexpr Choice<TrendDirection> kTrendDirections[] = {
     {"up", TrendDirection::up},

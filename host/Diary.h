@@ -113,6 +113,8 @@ struct Workout {
   std::vector<Split> splits;
   std::optional<Route> route;
   std::optional<Weather> weather;
+  /// Read from an activity file of its own, not from the diary's.
+  bool isImported = false;
 };
 
 enum class TrendDirection { up, steady, down };

@@ -4,10 +4,12 @@
 #include <stdexcept>
 #include <utility>
 
+#include "host/ActivityFile.h"
 #include "platform/foundation/Language.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/Settings.h"
 #include "platform/runtime/Dispatch.h"
+#include "reader/SummaryDescription.h"
 
 namespace tavro {
 namespace {
@@ -52,10 +54,13 @@ SessionOptions optionsBesideProgram() {
 Session::Session(const SessionOptions& options) {
   setReaderResources(options.reader);
   Diary diary = Diary::read(options.diary);
+  if (options.activity) {
+    diary.workouts.push_back(readActivityFile(*options.activity));
+  }
   applySettings(options, diary);
   application_ = std::make_unique<Application>(std::move(diary));
   if (options.withPlugin) {
-    loadAccessibilityBundle(options.bundle);
+    letSummariesDescribeRings(loadAccessibilityBundle(options.bundle));
   }
 }
 

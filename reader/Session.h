@@ -18,9 +18,10 @@ struct SessionOptions {
   std::optional<std::string> now;  ///< "2026-03-02T08:15", local time; with "Z" UTC
   std::optional<HKWheelchairUse> wheelchair;
   bool withPlugin = true;
-  std::string diary;   ///< path
-  std::string bundle;  ///< path
-  std::string reader;  ///< folder of the reader's own words
+  std::string diary;                    ///< path
+  std::optional<std::string> activity;  ///< path; becomes the diary's latest workout
+  std::string bundle;                   ///< path
+  std::string reader;                   ///< folder of the reader's own words
 };
 
 /// The paths of what lies beside the running program.

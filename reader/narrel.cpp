@@ -35,6 +35,8 @@ void addSessionOptions(CLI::App& app, SessionOptions& options) {
       "--without-plugin", [&](std::int64_t) { options.withPlugin = false; },
       "Read the application as it is on its own");
   app.add_option("--diary", options.diary, "Another diary to show");
+  app.add_option("--activity", options.activity,
+                 "A recorded activity (GPX or TCX) to show as the latest workout");
   app.add_option("--bundle", options.bundle, "Another plug-in bundle to load");
 }
 

@@ -2,11 +2,12 @@
 
 #include <string>
 
+#include "platform/foundation/NSDate.h"
 #include "platform/foundation/NSString.h"
 
 namespace tavro {
 
-/// An achievement as the achievements library knows it. Message: `identifier`.
+/// An achievement as the achievements library knows it.
 class ACHAchievement : public NSObject {
  public:
   static constexpr Name className = "ACHAchievement";
@@ -15,6 +16,10 @@ class ACHAchievement : public NSObject {
   std::string title;
   /// The title for a person who uses a wheelchair; empty where it is the same.
   std::string wheelchairTitle;
+  /// How far the user is; may have several lines.
+  std::string progress;
+  /// A moment of the day on which it was earned; nil before.
+  Ref<NSDate> earnedDate;
 };
 
 /// Names achievements for one person. Messages: `setName:`, `setWheelchairUser:`,

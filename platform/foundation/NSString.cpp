@@ -1,6 +1,10 @@
 #include "platform/foundation/NSString.h"
 
+#include <unicode/uchar.h>
 #include <unicode/unistr.h>
+
+#include <algorithm>
+#include <limits>
 
 #include "platform/foundation/IcuSupport.h"
 
@@ -43,6 +47,32 @@ Ref<NSArray> componentsSeparatedByNewlines(const NSString& text) {
     }
     rest.remove_prefix(end + 1);
   }
+}
+
+std::int64_t integerValue(const NSString& text) {
+  using Limits = std::numeric_limits<std::int64_t>;
+  const icu::UnicodeString whole = borrowed(text.text());
+  std::int32_t index = 0;
+  while (index < whole.length() && u_isUWhiteSpace(whole.char32At(index)) != 0) {
+    index = whole.moveIndex32(index, 1);
+  }
+  const bool isNegative = index < whole.length() && whole.charAt(index) == u'-';
+  if (isNegative || (index < whole.length() && whole.charAt(index) == u'+')) {
+    ++index;
+  }
+  // Summed below zero, where there is one more number.
+  std::int64_t sum = 0;
+  for (; index < whole.length(); index = whole.moveIndex32(index, 1)) {
+    const std::int32_t digit = u_charDigitValue(whole.char32At(index));
+    if (digit < 0) {
+      break;
+    }
+    if (sum < (Limits::min() + digit) / 10) {
+      return isNegative ? Limits::min() : Limits::max();
+    }
+    sum = sum * 10 - digit;
+  }
+  return isNegative ? sum : -std::max(sum, -Limits::max());
 }
 
 bool containsString(const NSString& string, std::u16string_view part) {

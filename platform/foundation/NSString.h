@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <initializer_list>
 #include <string>
 #include <string_view>
@@ -73,6 +74,9 @@ Ref<NSString> localizedStringWithFormat(const Ref<NSString>& format,
 
 /// The pieces between line breaks (every newline character of Unicode); empty pieces included.
 Ref<NSArray> componentsSeparatedByNewlines(const NSString& text);
+/// The whole number that the text begins with, after white space and a sign, in digits of any
+/// script; 0 when there is none. Numbers beyond 64 bits become the nearest one that fits.
+std::int64_t integerValue(const NSString& text);
 /// Whether the text occurs in the string, unit by unit; the empty text occurs nowhere.
 bool containsString(const NSString& string, std::u16string_view part);
 /// The string with every occurrence of `part` replaced.

@@ -6,9 +6,10 @@
 namespace tavro {
 namespace {
 
-// In ICU's unit, about a millisecond each: a pattern that tries everything ends before anyone
-// would notice.
+// In ICU's unit, 10000 steps or about a millisecond each: a pattern that tries everything ends
+// before anyone would notice, and a long text gets some twenty steps for each of its units.
 constexpr std::int32_t kTimeLimit = 100;
+constexpr std::int32_t kUnitsForEachLimit = 500;
 
 }  // namespace
 
@@ -26,7 +27,7 @@ std::optional<NSTextCheckingResult> NSRegularExpression::firstMatch(const NSStri
   const icu::UnicodeString searched = borrowed(text.text());  // outlives the matcher
   const std::unique_ptr<icu::RegexMatcher> matcher(pattern->compiled->matcher(searched, status));
   requireSuccess(status, "searching a text");
-  matcher->setTimeLimit(kTimeLimit, status);
+  matcher->setTimeLimit(kTimeLimit + searched.length() / kUnitsForEachLimit, status);
   if (!matcher->find(status) || U_FAILURE(status)) {
     return std::nullopt;
   }

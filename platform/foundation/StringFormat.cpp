@@ -119,7 +119,7 @@ class Filler {
   void appendObject(const id& object) {
     Ref<NSString> text = as<NSString>(object);
     if (!text) {
-      text = as<NSString>(send<id>(object, "description"));
+      text = as<NSString>(trySend<id>(object, "description"));
     }
     if (text) {
       filled_.append(text->text());

@@ -13,10 +13,11 @@ namespace tavro {
 
 TextFile::TextFile(std::string path) : path_(std::move(path)) {
   std::ifstream stream(path_, std::ios::binary);
-  text_.assign(std::istreambuf_iterator<char>(stream), {});
+  stream.peek();  // a folder can be opened; reading it is what fails
   if (!stream.is_open() || stream.bad()) {
     throw FileError(path_ + ": the file cannot be read");
   }
+  text_.assign(std::istreambuf_iterator<char>(stream), {});
   const auto length = static_cast<std::int32_t>(text_.size());
   for (std::int32_t offset = 0; offset < length;) {
     const auto start = static_cast<std::size_t>(offset);

@@ -5,7 +5,7 @@
 
 #include "platform/foundation/NSBundle.h"
 
-// Internal to platform/foundation: the files of string tables.
+// Text files that people write or export: string tables, and what an application reads.
 
 namespace tavro {
 

@@ -12,6 +12,7 @@ enum class HKWorkoutActivityType : std::int64_t {
   swimming = 46,
   walking = 52,
   yoga = 57,
+  other = 3000,
 };
 
 /// The user's answer to whether they use a wheelchair.

@@ -51,7 +51,10 @@ bool UIControl::sendAction() {
   if (!action_) {
     return false;
   }
-  action_();
+  // The action may put another screen in the place of the control's own.
+  const Ref<UIControl> kept(this);
+  const std::function<void()> action = action_;
+  action();
   return true;
 }
 

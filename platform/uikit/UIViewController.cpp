@@ -132,8 +132,9 @@ UIWindow::~UIWindow() {
 void UIWindow::makeKey() { keyWindowOfProcess = this; }
 
 void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
-  for (const id& view : *subviews()) {
-    as<UIView>(view)->removeFromSuperview();
+  const std::vector<Ref<UIView>> shown = subviewList();
+  for (const Ref<UIView>& view : shown) {
+    view->removeFromSuperview();
   }
   controller_ = controller;
   if (!controller) {

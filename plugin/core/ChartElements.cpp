@@ -29,6 +29,32 @@ Ref<NSString> spanOfDay(NSDateIntervalFormatter& formatter, std::string_view dat
   return formatter.stringFromDate(from, dateByAddingTimeInterval(from, length));
 }
 
+void addDayParts(NSMutableArray& elements, const Ref<UIView>& chart, const DayParts& parts,
+                 const std::function<id(std::size_t)>& valueOf) {
+  const auto formatter = make<NSDateIntervalFormatter>();
+  const Ref<NSDate> startOfDay = currentCalendar()->startOfDayForDate(dateNow());
+  for (std::size_t part = 0; part < parts.count; ++part) {
+    const auto index = static_cast<double>(part);
+    const bool isLast = part == parts.count - 1;
+    const Ref<NSString> label =
+        spanOfDay(*formatter, isLast ? "h:mma" : parts.dateTemplate, startOfDay,
+                  index * parts.seconds, isLast ? parts.seconds - 1 : parts.seconds);
+    const CGRect frame{parts.size.width * index, 0, parts.size.width, parts.size.height};
+    addChartElement(elements, chart, frame, label, valueOf(part));
+  }
+}
+
+float amountOfPoint(const id& point) {
+  return static_cast<float>(trySend<CGPoint>(point, "CGPointValue").y);
+}
+
+Ref<NSArray> descendantsOfClass(Object* view, Name className) {
+  Class* const wanted = AXSafeClassFromString(className);
+  return as<NSArray>(trySend<id>(
+      view, "_accessibilityFindSubviewDescendantsPassingTest:",
+      ViewTest([wanted](const id& descendant) { return isKindOf(descendant.get(), wanted); })));
+}
+
 void annotateLabelPair(const id& labelPair) {
   trySend<void>(labelPair, "setIsAccessibilityElement:", true);
   trySend<void>(labelPair,

@@ -1,8 +1,10 @@
 #pragma once
 
+#include <functional>
+
 #include "platform/accessibility/KeyAccess.h"
 #include "platform/foundation/Formatters.h"
-#include "platform/uikit/UIAccessibility.h"
+#include "platform/uikit/UIView.h"
 
 // What the chart categories share: a chart keeps the host's points and the elements that were built
 // of them as retained values; loading renews the points and drops the elements.
@@ -17,10 +19,10 @@ void loadGraphData(Object* chart, Name key, Name firstObjectClass, Name retained
 /// the build gets the same list, and then filled by `build(list)`.
 template <class Build>
 id elementsBuiltOnce(Object* chart, std::size_t capacity, const Build& build) {
-  if (const id built = _accessibilityValueForKey(chart, kUIAccessibilityStorageKeyChildren)) {
+  if (id built = _accessibilityValueForKey(chart, kUIAccessibilityStorageKeyChildren)) {
     return built;
   }
-  const Ref<NSMutableArray> elements = mutableArray(capacity);
+  Ref<NSMutableArray> elements = mutableArray(capacity);
   _accessibilitySetRetainedValue(chart, elements, kUIAccessibilityStorageKeyChildren);
   build(*elements);
   _accessibilitySetRetainedValue(chart, elements, kUIAccessibilityStorageKeyChildren);
@@ -35,6 +37,29 @@ void addChartElement(NSMutableArray& elements, const Ref<UIView>& chart, const C
 /// `length` seconds, by a template.
 Ref<NSString> spanOfDay(NSDateIntervalFormatter& formatter, std::string_view dateTemplate,
                         const Ref<NSDate>& startOfDay, double start, double length);
+
+/// The retained value in which the charts of the day view keep the host's points.
+inline constexpr Name kDayViewGraphElements = "kAXDayViewCellGraphElements";
+
+/// How a chart of the day view divides the day.
+struct DayParts {
+  std::size_t count = 0;
+  double seconds = 0;             ///< the length of each part
+  std::string_view dateTemplate;  ///< names each part but the last
+  CGSize size;                    ///< of each part's element
+};
+
+/// Adds an element for each part of the present day, side by side from the chart's left edge. The
+/// last part ends a second early, within the day, and says its minutes. `valueOf` yields the spoken
+/// value of a part.
+void addDayParts(NSMutableArray& elements, const Ref<UIView>& chart, const DayParts& parts,
+                 const std::function<id(std::size_t)>& valueOf);
+
+/// The y of a chart's point; 0 for what is not a point.
+float amountOfPoint(const id& point);
+
+/// The views below a view that are of that class, in tree order; empty when there is no such class.
+Ref<NSArray> descendantsOfClass(Object* view, Name className);
 
 /// Makes a chart's title-and-value pair one heading that says both; nothing happens to nil.
 void annotateLabelPair(const id& labelPair);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/foundation/NSAttributedString.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/NSString.h"
 #include "platform/healthkit/HKUnit.h"
@@ -28,6 +29,25 @@ tavro::Ref<tavro::HKUnit> accessibilityHKUnitForTrendType(std::int64_t trendType
 /// first call of the process; nil for any other object.
 tavro::Ref<tavro::NSString> accessibilityLocalizedStringForAchievement(
     const tavro::id& achievement);
+
+/// The description of the date's three rings: what the day's summary in the host's activity cache
+/// answers for its fractions. nil when there is no summary, when one of its fractions is negative
+/// or not a number, and when nobody answers for the summary. `isCapped` is handed on.
+tavro::Ref<tavro::NSString> accessibilityTavroStringForDate(const tavro::Ref<tavro::NSDate>& date,
+                                                            bool isCapped);
+
+/// Three fractions as one sentence: each ring's name, then its per cent, where 1.0 is one hundred;
+/// what is below 0 or not a number counts as 0. When the fractions are capped, exactly 1.0 is said
+/// as a goal completed, and three of them as all goals completed.
+tavro::Ref<tavro::NSString> accessibilityDescriptionForPercentages(double move, double exercise,
+                                                                   double stand, bool isCapped);
+
+/// A label's text, given as a string or an attributed string, with its first pace (8'05'') replaced
+/// by its whole seconds and those marked as a duration of minutes and seconds. The text for "no
+/// data" when a dash placeholder is anywhere in it; the text as it is when it holds no pace; nil
+/// for nil and for an empty text. Attributes of the text itself are not kept.
+tavro::Ref<tavro::AXAttributedString> accessibilityAttributedStringForPaceContainingString(
+    const tavro::id& text);
 
 }  // extern "C"
 

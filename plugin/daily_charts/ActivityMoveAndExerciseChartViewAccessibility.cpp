@@ -2,14 +2,12 @@
 
 #include "platform/accessibility/SafeCategory.h"
 #include "platform/accessibility/Speech.h"
-#include "platform/foundation/NSValue.h"
 #include "plugin/core/ChartElements.h"
 #include "plugin/core/Exports.h"
 
 namespace tavro {
 namespace {
 
-constexpr Name kGraphElements = "kAXDayViewCellGraphElements";
 constexpr std::size_t kSlices = 8;
 constexpr double kSecondsPerSlice = 10800;
 constexpr float kSliceShare = 0.125F;
@@ -45,7 +43,7 @@ class AmountSpeech {
 float sumOfPoints(const NSArray& points, std::size_t first, std::size_t end) {
   float sum = 0;
   for (std::size_t index = first; index < end && index < points.count(); ++index) {
-    sum += static_cast<float>(trySend<CGPoint>(points[index], "CGPointValue").y);
+    sum += amountOfPoint(points[index]);
   }
   return sum;
 }
@@ -64,13 +62,13 @@ class ActivityMoveAndExerciseChartViewAccessibility : public SafeCategory {
 
   void _accessibilityLoadAccessibilityInformation() {
     super.send<void>();
-    loadGraphData(self, "moveAndExerciseChartPoints", "NSValue", kGraphElements);
+    loadGraphData(self, "moveAndExerciseChartPoints", "NSValue", kDayViewGraphElements);
   }
 
   // The host's own reload would describe the chart as one value; it is replaced, not continued.
   void accessibilityReloadData() { send<void>(self, "_accessibilityLoadAccessibilityInformation"); }
 
-  id _accessibilityGraphData() { return _accessibilityValueForKey(self, kGraphElements); }
+  id _accessibilityGraphData() { return _accessibilityValueForKey(self, kDayViewGraphElements); }
 
  private:
   void build(NSMutableArray& elements) {
@@ -79,22 +77,15 @@ class ActivityMoveAndExerciseChartViewAccessibility : public SafeCategory {
     if (!chart || !points) {
       return;
     }
-    const auto formatter = make<NSDateIntervalFormatter>();
-    const Ref<NSDate> startOfDay = currentCalendar()->startOfDayForDate(dateNow());
     const AmountSpeech speech(safeIntForKey(self, "moveAndExerciseChartViewType"));
     const float height = std::floor(static_cast<float>(chart->frame().size.height));
     const float width = std::floor(static_cast<float>(chart->frame().size.width) * kSliceShare);
     const std::size_t pointsPerSlice = points->count() / kSlices;
-    for (std::size_t slice = 0; slice < kSlices; ++slice) {
-      const auto index = static_cast<double>(slice);
-      const bool isLast = slice == kSlices - 1;
-      // The last slice ends within the day, a second before midnight.
-      const Ref<NSString> label =
-          spanOfDay(*formatter, isLast ? "h:mma" : "hxa", startOfDay, index * kSecondsPerSlice,
-                    isLast ? kSecondsPerSlice - 1 : kSecondsPerSlice);
-      const float sum = sumOfPoints(*points, slice * pointsPerSlice, (slice + 1) * pointsPerSlice);
-      addChartElement(elements, chart, {width * index, 0, width, height}, label, speech.text(sum));
-    }
+    addDayParts(elements, chart, {kSlices, kSecondsPerSlice, "hxa", {width, height}},
+                [&](std::size_t slice) {
+                  return speech.text(
+                      sumOfPoints(*points, slice * pointsPerSlice, (slice + 1) * pointsPerSlice));
+                });
   }
 };
 

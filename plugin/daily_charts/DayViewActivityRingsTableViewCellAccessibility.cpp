@@ -1,5 +1,5 @@
-#include "platform/accessibility/KeyAccess.h"
 #include "platform/accessibility/SafeCategory.h"
+#include "plugin/core/ChartElements.h"
 
 namespace tavro {
 namespace {
@@ -10,12 +10,7 @@ class DayViewActivityRingsTableViewCellAccessibility : public SafeCategory {
   static constexpr Name className = "DayViewActivityRingsTableViewCellAccessibility";
   static constexpr Name target = "TavroApp.DayViewActivityRingsTableViewCell";
 
-  id accessibilityElements() {
-    Class* const ringsClass = AXSafeClassFromString("ARUIRingsView");
-    return trySend<id>(
-        self, "_accessibilityFindSubviewDescendantsPassingTest:",
-        ViewTest([ringsClass](const id& view) { return isKindOf(view.get(), ringsClass); }));
-  }
+  id accessibilityElements() { return descendantsOfClass(self, "ARUIRingsView"); }
 };
 
 constexpr HostCheck kHostContract[] = {classExists("ARUIRingsView")};

@@ -114,6 +114,35 @@ INSTANTIATE_TEST_SUITE_P(FaultyTranslations, FormatTest,
                                            FormatCase{"%s %ld %5 %$@ %1$", "%s %ld %5 %$@ %1$"},
                                            FormatCase{"%1@", "%1@"}));
 
+TEST_F(StringTest, TheWholeNumberThatATextBeginsWith) {
+  using Limits = std::numeric_limits<std::int64_t>;
+  const struct {
+    std::string text;
+    std::int64_t number;
+  } cases[] = {
+      {"", 0},
+      {"12", 12},
+      {" \u00a0-12.9 kg", -12},
+      {"+7", 7},
+      {"- 7", 0},
+      {"--7", 0},
+      {"kg 7", 0},
+      {"٤٢", 42},
+      {"1𝟠x", 18},
+      {"9223372036854775807", Limits::max()},
+      {"9223372036854775808", Limits::max()},
+      {"-9223372036854775808", Limits::min()},
+      {"-9223372036854775809", Limits::min()},
+      {std::string(100'000, '9'), Limits::max()},
+      {"-" + std::string(100'000, '9'), Limits::min()},
+      {std::string(100'000, '0') + "8", 8},
+      {"-", 0},
+  };
+  for (const auto& each : cases) {
+    EXPECT_EQ(integerValue(*string(each.text)), each.number) << each.text.substr(0, 30);
+  }
+}
+
 TEST_F(StringTest, FormattedObjectsDescribeThemselves) {
   const Ref<NSString> format = string("<%@>");
   EXPECT_EQ(heard(stringWithFormat(format, {number(std::int64_t{-7})})), "<-7>");

@@ -4,13 +4,10 @@
 
 #include "host/screens/day/DayViewController.h"
 #include "platform/accessibility/SafeCategory.h"
-#include "platform/foundation/NSValue.h"
-#include "tests/support/Plugin.h"
+#include "tests/support/Charts.h"
 
 namespace tavro {
 namespace {
-
-using Utterances = std::vector<std::string>;
 
 /// A chart whose host answers what a test wants it to answer.
 class OddChart : public ActivityMoveAndExerciseChartView {
@@ -46,7 +43,7 @@ const Registered reentrantChart =
 int hostReloads = 0;
 void countReload(Object* /*self*/) { ++hostReloads; }
 
-class DailyChartTest : public PluginTest {
+class DailyChartTest : public ChartTest {
  protected:
   Ref<OddChart> chartWith(const id& points, std::int64_t type = 0) {
     const auto chart = makeView<OddChart>({10, 20, 300, 99.9});
@@ -55,22 +52,6 @@ class DailyChartTest : public PluginTest {
     chart->type = type;
     show(chart);
     return chart;
-  }
-
-  static Ref<NSArray> pointsOf(const std::vector<double>& amounts) {
-    std::vector<id> points;
-    for (const double amount : amounts) {
-      points.emplace_back(value(CGPoint{0, amount}));
-    }
-    return arrayWithObjects(std::move(points));
-  }
-
-  static Utterances valuesOf(const id& chart) {
-    Utterances values;
-    for (const id& element : *elementsOf(chart)) {
-      values.push_back(valueOf(element));
-    }
-    return values;
   }
 };
 

@@ -1,5 +1,6 @@
 #include "host/screens/day/DayViewController.h"
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 
@@ -50,6 +51,26 @@ Ref<UIView> exerciseRow(const Day& day, const Hours& hours) {
   return row;
 }
 
+/// The hours of the day that have begun by now and do not count.
+std::size_t idleHours(const Day& day, const Hours& hours) {
+  constexpr std::size_t hoursOfDay = 24;
+  const bool isToday = day.date == dayOf(dateNow());
+  const std::int64_t present = currentCalendar()->componentsFromDate(dateNow())->hour;
+  const std::size_t begun = isToday ? static_cast<std::size_t>(present) + 1 : hoursOfDay;
+  return static_cast<std::size_t>(std::count(
+      hours.stand.begin(), hours.stand.begin() + static_cast<std::ptrdiff_t>(begun), false));
+}
+
+Ref<UIView> standRow(const Day& day, const Hours& hours) {
+  const auto row = makeView<DayViewStandChartTableViewCell>();
+  row->pair().setTexts("Stand", progress(day.stand, day.standGoal, "HRS"));
+  row->chart().setHours(hours.stand);
+  const std::size_t idle = idleHours(day, hours);
+  row->idleHours().setText(
+      string(std::to_string(idle) + (idle == 1 ? " IDLE HOUR" : " IDLE HOURS")));
+  return row;
+}
+
 }  // namespace
 
 Ref<HKActivitySummary> summaryOf(const Rings& rings) {
@@ -88,6 +109,7 @@ void DayViewController::viewDidLoad() {
   const Hours hours = day_->hours.value_or(Hours());
   table->appendRow(moveRow(*day_, hours), DayViewMoveAndExerciseChartTableViewCell::height);
   table->appendRow(exerciseRow(*day_, hours), DayViewMoveAndExerciseChartTableViewCell::height);
+  table->appendRow(standRow(*day_, hours), DayViewStandChartTableViewCell::height);
 }
 
 }  // namespace tavro

@@ -3,6 +3,7 @@
 #include "host/Diary.h"
 #include "host/libraries/ARUIRingsView.h"
 #include "host/screens/day/MoveAndExerciseChart.h"
+#include "host/screens/day/StandChart.h"
 #include "platform/uikit/UIViewController.h"
 
 namespace tavro {
