@@ -2,15 +2,13 @@
 
 #include <algorithm>
 
-#include "platform/accessibility/Traversal.h"
-
 namespace tavro {
-namespace {
 
-HeardElement read(const AccessibleElement& found) {
+HeardElement readElement(const AccessibleElement& found) {
   const id& element = found.element;
   HeardElement heard;
   heard.element = element;
+  heard.containers = found.containers;
   heard.facts = {
       .label = trySend<id>(element, "accessibilityLabel"),
       .value = trySend<id>(element, "accessibilityValue"),
@@ -20,18 +18,18 @@ HeardElement read(const AccessibleElement& found) {
   };
   heard.frame = trySend<CGRect>(element, "accessibilityFrame");
   heard.activationPoint = trySend<CGPoint>(element, "accessibilityActivationPoint");
-  for (const id& container : found.containers) {
-    heard.containers.emplace_back(container.get()->isa()->name().text());
-  }
   heard.utterance = utteranceOf(heard.facts);
   return heard;
 }
 
-}  // namespace
+std::string utteranceAfterAdjusting(const HeardElement& element) {
+  const std::string value = spokenText(element.facts.value);
+  return value.empty() ? element.utterance : value;
+}
 
 std::vector<HeardElement> readElements(const id& root) {
   std::vector<HeardElement> heard;
-  std::ranges::transform(accessibleElements(root), std::back_inserter(heard), &read);
+  std::ranges::transform(accessibleElements(root), std::back_inserter(heard), &readElement);
   return heard;
 }
 

@@ -34,7 +34,13 @@ Json traitsJson(UIAccessibilityTraits traits) {
 
 Json textJson(const id& text) { return text ? Json(spokenText(text)) : Json(nullptr); }
 
+std::string className(const id& object) { return std::string(object.get()->isa()->name().text()); }
+
 Json jsonOf(const HeardElement& element) {
+  Json containers = Json::array();
+  for (const id& container : element.containers) {
+    containers.push_back(className(container));
+  }
   return {{"utterance", element.utterance},
           {"label", textJson(element.facts.label)},
           {"value", textJson(element.facts.value)},
@@ -42,8 +48,8 @@ Json jsonOf(const HeardElement& element) {
           {"traits", traitsJson(element.facts.traits)},
           {"frame", jsonOf(element.frame)},
           {"activationPoint", {element.activationPoint.x, element.activationPoint.y}},
-          {"class", element.element.get()->isa()->name().text()},
-          {"containers", element.containers}};
+          {"class", className(element.element)},
+          {"containers", containers}};
 }
 
 /// Rows of cells in aligned columns; the last column is not padded.
@@ -71,39 +77,63 @@ std::string outcomeText(bool good, std::string_view word, const std::string& rea
   return good ? std::string(word) : "FAILED: " + reason;
 }
 
+std::string linesOf(const std::vector<std::string>& texts) {
+  std::string lines;
+  for (const std::string& text : texts) {
+    lines += text + "\n";
+  }
+  return lines;
+}
+
 }  // namespace
 
-std::string transcript(const std::vector<HeardElement>& elements) {
+std::string transcript(const std::vector<HeardElement>& elements, Verbosity verbosity) {
+  const std::vector<AccessibleElement> found(elements.begin(), elements.end());
+  const ContainerSpeech containers(verbosity, found);
+  std::string text;
+  std::vector<id> open;
+  for (std::size_t index = 0; index < elements.size(); ++index) {
+    const HeardElement& element = elements[index];
+    if (!element.utterance.empty()) {
+      text += linesOf(containers.passage(open, element.containers));
+      text += containers.withPosition(element.utterance, index) + "\n";
+      open = element.containers;
+    }
+  }
+  return text + linesOf(containers.passage(open, {}));
+}
+
+std::string headings(const std::vector<HeardElement>& elements) {
   std::string text;
   for (const HeardElement& element : elements) {
-    text += element.utterance.empty() ? "" : element.utterance + "\n";
+    text += isHeading(element) ? element.utterance + "\n" : "";
   }
   return text;
 }
 
-std::string tour(Session& session) {
+std::string tour(Session& session, Verbosity verbosity) {
   std::string text;
   for (const std::string_view screen : Application::screenNames()) {
     text += (text.empty() ? "[" : "\n[") + std::string(screen) + "]\n" +
-            transcript(session.read(screen));
+            transcript(session.read(screen), verbosity);
   }
   return text;
 }
 
 std::string treeText(const std::vector<HeardElement>& elements) {
   std::ostringstream text;
-  std::vector<std::string> open;
+  std::vector<id> open;
   for (const HeardElement& element : elements) {
     if (element.containers != open) {
       open = element.containers;
       for (std::size_t depth = 0; depth < open.size(); ++depth) {
-        text << std::string(depth * 2, ' ') << open[depth] << "\n";
+        text << std::string(depth * 2, ' ') << className(open[depth]) << "\n";
       }
     }
     const CGRect& frame = element.frame;
     text << std::string(open.size() * 2, ' ') << "\"" << element.utterance << "\" "
-         << element.element.get()->isa()->name().text() << " (" << frame.origin.x << ", "
-         << frame.origin.y << ", " << frame.size.width << ", " << frame.size.height << ")\n";
+         << className(element.element) << " (" << frame.origin.x << ", " << frame.origin.y << ", "
+         << frame.size.width << ", " << frame.size.height << ")\n";
   }
   return text.str();
 }

@@ -5,14 +5,18 @@
 #include <vector>
 
 #include "platform/accessibility/Validation.h"
+#include "reader/Containers.h"
 #include "reader/Session.h"
 
 namespace tavro {
 
 /// The utterances, a line each; an element with nothing to say is left out.
-std::string transcript(const std::vector<HeardElement>& elements);
+std::string transcript(const std::vector<HeardElement>& elements,
+                       Verbosity verbosity = Verbosity::elements);
+/// The utterances of the headings alone, a line each.
+std::string headings(const std::vector<HeardElement>& elements);
 /// The transcripts of all screens in order, each under its name.
-std::string tour(Session& session);
+std::string tour(Session& session, Verbosity verbosity = Verbosity::elements);
 /// Each element's utterance with its class and frame, below the containers that lead to it.
 std::string treeText(const std::vector<HeardElement>& elements);
 /// Every fact of every element as JSON.

@@ -12,13 +12,18 @@
 #include "reader/SummaryDescription.h"
 
 namespace tavro {
+
+void requireKnownLocale(const std::string& locale) {
+  if (!isKnownLocale(locale)) {
+    throw std::invalid_argument("\"" + locale + "\" is not a locale that is known here");
+  }
+}
+
 namespace {
 
 void applySettings(const SessionOptions& options, const Diary& diary) {
   Settings& settings = Settings::current();
-  if (!isKnownLocale(options.locale)) {
-    throw std::invalid_argument("\"" + options.locale + "\" is not a locale that is known here");
-  }
+  requireKnownLocale(options.locale);
   settings.locale = options.locale;
   if (!options.calendar.empty() && !calendarWithIdentifier(options.calendar)) {
     throw std::invalid_argument("\"" + options.calendar + "\" is not a calendar");
@@ -66,7 +71,7 @@ Session::Session(const SessionOptions& options) {
 
 Session::~Session() { GlobalQueue::shared().drain(); }
 
-std::vector<HeardElement> Session::read(std::string_view screen) {
+void Session::show(std::string_view screen) {
   if (!application_->showScreen(screen)) {
     std::string known;
     for (const std::string_view name : Application::screenNames()) {
@@ -75,6 +80,16 @@ std::vector<HeardElement> Session::read(std::string_view screen) {
     throw std::invalid_argument("there is no screen \"" + std::string(screen) +
                                 "\"; the screens are: " + known);
   }
+}
+
+void Session::setLocale(const std::string& locale) {
+  requireKnownLocale(locale);
+  Settings::current().locale = locale;
+  reloadAccessibilityInformation();
+}
+
+std::vector<HeardElement> Session::read(std::string_view screen) {
+  show(screen);
   return readElements(id(&application_->window()));
 }
 

@@ -27,6 +27,9 @@ struct SessionOptions {
 /// The paths of what lies beside the running program.
 SessionOptions optionsBesideProgram();
 
+/// Throws `std::invalid_argument` with one sentence for a locale that is not known.
+void requireKnownLocale(const std::string& locale);
+
 /// A screen reader at work on the sample application: settings, application, plug-in. One a
 /// process.
 class Session {
@@ -38,8 +41,12 @@ class Session {
   Session(const Session&) = delete;
   Session& operator=(const Session&) = delete;
 
-  /// Shows a screen and reads it from top to bottom. Throws `std::invalid_argument` for a name that
-  /// no screen has.
+  /// Shows a screen. Throws `std::invalid_argument` for a name that no screen has.
+  void show(std::string_view screen);
+  /// Changes the user's locale while the application runs; what is on screen is loaded anew. Throws
+  /// `std::invalid_argument` for a locale that is not known.
+  void setLocale(const std::string& locale);
+  /// Shows a screen and reads it from top to bottom.
   std::vector<HeardElement> read(std::string_view screen);
 
   [[nodiscard]] Application& application() { return *application_; }

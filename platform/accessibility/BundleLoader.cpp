@@ -57,6 +57,7 @@ LoadedBundle openAccessibilityBundle(const std::string& path) {
     throw FileError(executable + ": the bundle's code cannot be opened: " +
                     (reason == nullptr ? "unknown reason" : reason));
   }
+  bundle.problems_ = registrationProblems();
   return bundle;
 }
 

@@ -17,11 +17,14 @@ class LoadedBundle {
   [[nodiscard]] const std::string& path() const { return path_; }
   /// Calls the principal class once more; a plug-in acts on the first call of a process only.
   void initialize() const;
+  /// The declarations that could not be carried out by the time the bundle was open.
+  [[nodiscard]] const std::vector<RegistrationProblem>& problems() const { return problems_; }
 
  private:
   friend LoadedBundle openAccessibilityBundle(const std::string& path);
   std::string path_;
   std::string principalClass_;
+  std::vector<RegistrationProblem> problems_;
   void* handle_ = nullptr;
 };
 

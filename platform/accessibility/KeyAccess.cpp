@@ -51,6 +51,14 @@ bool isAccessor(const Method* method) {
          method->signature.encodings != "v";
 }
 
+/// What `Access::kind` says of a variable; a block cannot be read as a value.
+char kindOf(const InstanceVariable& variable) {
+  if (variable.isObject) {
+    return '@';
+  }
+  return variable.type.starts_with("@?") ? '\0' : variable.type.front();
+}
+
 /// Decides how a key is read; the order of the candidates is the promise of safe key access.
 Access resolve(Class* isa, Name key) {
   Access access{.key = key.hash()};
@@ -73,7 +81,7 @@ Access resolve(Class* isa, Name key) {
     for (const Name name : {underscored, key}) {
       if (const InstanceVariable* const variable = isa->variable(name)) {
         access.variable = variable;
-        access.kind = variable->isObject ? '@' : variable->type.front();
+        access.kind = kindOf(*variable);
         return access;
       }
     }
@@ -111,6 +119,7 @@ const Access& accessFor(Class* isa, Name key) {
       return *known;
     }
   }
+  const auto lock = lockClassTables();
   return remember(isa, resolve(isa, key));
 }
 

@@ -1,5 +1,6 @@
 #include "platform/accessibility/Labels.h"
 
+#include <optional>
 #include <string>
 
 #include "platform/accessibility/KeyAccess.h"
@@ -97,14 +98,16 @@ id AXLabelForElements(const Ref<NSArray>& elements) {
 id UIAXLabelForElements(const Ref<NSArray>& elements) { return AXLabelForElements(elements); }
 
 CGRect UIAXFrameForElements(const Ref<NSArray>& elements) {
-  if (!elements || elements->count() == 0) {
-    return {};
+  std::optional<CGRect> frame;
+  if (elements) {
+    for (const id& element : *elements) {
+      AXPerformSafeBlock([&] {
+        const auto each = send<CGRect>(element, "accessibilityFrame");
+        frame = frame ? CGRectUnion(*frame, each) : each;
+      });
+    }
   }
-  auto frame = trySend<CGRect>((*elements)[0], "accessibilityFrame");
-  for (const id& element : *elements) {
-    frame = CGRectUnion(frame, trySend<CGRect>(element, "accessibilityFrame"));
-  }
-  return frame;
+  return frame.value_or(CGRect());
 }
 
 id UIAXStringForAllChildren(const Ref<UIView>& view) {

@@ -24,7 +24,8 @@ id __AXStringForVariables(std::initializer_list<id> parts);
 id AXLabelForElements(const Ref<NSArray>& elements);
 /// The same.
 id UIAXLabelForElements(const Ref<NSArray>& elements);
-/// The union of the screen frames; the zero rectangle when there is none.
+/// The union of the screen frames, without objects that raise; the zero rectangle when there is
+/// none.
 CGRect UIAXFrameForElements(const Ref<NSArray>& elements);
 /// The labels of all accessible descendants in reading order; nil for nil.
 id UIAXStringForAllChildren(const Ref<UIView>& view);

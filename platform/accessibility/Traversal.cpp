@@ -32,15 +32,18 @@ Children childrenOf(const id& object) {
     children.objects.assign(elements->begin(), elements->end());
   } else if (const auto view = as<UIView>(object)) {
     const auto& subviews = view->subviewList();
-    children.objects = sortedByGeometry({subviews.begin(), subviews.end()});
+    children.objects.assign(subviews.begin(), subviews.end());
   }
-  // The frontmost modal view is the only one that is heard.
+  // The frontmost modal view is the only one that is heard; subviews are listed back to front.
   const auto& objects = children.objects;
   for (auto child = objects.rbegin(); child != objects.rend(); ++child) {
     if (trySend<bool>(*child, "accessibilityViewIsModal") && !isSilent(*child)) {
       children.objects = {id(*child)};
-      break;
+      return children;
     }
+  }
+  if (!children.isElementList) {
+    children.objects = sortedByGeometry(std::move(children.objects));
   }
   return children;
 }

@@ -20,7 +20,7 @@ struct HostCheck {
     instanceMethod,
     classMethod
   };
-  static constexpr std::size_t kMostEncodings = 6;
+  static constexpr std::size_t kMostEncodings = 8;
 
   Kind kind;
   Name className;

@@ -34,6 +34,13 @@ bool isKnownLocale(const std::string& name) {
   return false;
 }
 
+std::string nameOfLocale(const std::string& name) {
+  const icu::Locale locale = icu::Locale::createFromName(name.c_str());
+  icu::UnicodeString text;
+  std::string utf8;
+  return locale.getDisplayName(locale, text).toUTF8String(utf8);
+}
+
 bool isKnownTimeZone(const std::string& name) {
   const std::unique_ptr<icu::TimeZone> zone(
       icu::TimeZone::createTimeZone(icu::UnicodeString::fromUTF8(name)));

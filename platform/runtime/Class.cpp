@@ -28,16 +28,16 @@ std::vector<std::unique_ptr<OwnedTable>>& builtTables() {
 
 }  // namespace
 
+std::unique_lock<std::recursive_mutex> lockClassTables() {
+  return std::unique_lock(runtimeMutex());
+}
+
 Class::Class(const ClassDeclaration& declaration, Class* superclass, bool isMetaclass)
     : name_(declaration.name),
       superclass_(superclass),
       isMetaclass_(isMetaclass),
       image_(declaration.image),
       create_(isMetaclass ? nullptr : declaration.create) {
-  if (!isMetaclass) {
-    variables_ = declaration.variables;
-    protocols_ = declaration.protocols;
-  }
   if (superclass_ != nullptr) {
     superclass_->subclasses_.push_back(this);
   }
@@ -47,7 +47,9 @@ Object* Class::allocate() {
   for (Class* each = this; each != nullptr; each = each->superclass_) {
     if (each->create_ != nullptr) {
       Object* const object = each->create_();
-      object->becomeInstanceOf(this);
+      if (object != nullptr) {
+        object->becomeInstanceOf(this);
+      }
       return object;
     }
   }
@@ -102,8 +104,8 @@ const InstanceVariable* Class::variable(Name name) const {
 }
 
 void Class::setVariable(const InstanceVariable& variable) {
-  removeVariable(variable.name);
   const std::lock_guard lock(runtimeMutex());
+  removeVariable(variable.name);
   variables_.push_back(variable);
 }
 
@@ -281,6 +283,10 @@ class ClassRegistry {
       meta->retain();
       classes_.push_back(isa);
     }
+    for (const InstanceVariable& variable : declaration.variables) {
+      isa->setVariable(variable);
+    }
+    std::ranges::copy(declaration.protocols, std::back_inserter(isa->protocols_));
     for (const Method& method : declaration.methods) {
       isa->setMethod(method);
     }
@@ -302,6 +308,7 @@ class ClassRegistry {
     }
     std::ranges::transform(declaration.variables, std::back_inserter(names),
                            &InstanceVariable::name);
+    std::ranges::copy(declaration.protocols, std::back_inserter(names));
     for (const Name name : names) {
       if (NameTable::shared().add(name.hash(), name.text()) == nullptr) {
         return "the name \"" + std::string(name.text()) + "\" has the hash of another name";

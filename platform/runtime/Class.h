@@ -2,6 +2,7 @@
 
 #include <atomic>
 #include <deque>
+#include <mutex>
 #include <span>
 #include <string>
 #include <string_view>
@@ -158,6 +159,9 @@ class Class final : public Object {
   std::atomic<const DispatchTable*> table_{nullptr};
   std::atomic<const KeyTable*> keyTable_{nullptr};
 };
+
+/// Keeps class tables from changing; for what is built of them and kept beside them.
+[[nodiscard]] std::unique_lock<std::recursive_mutex> lockClassTables();
 
 /// A declaration that could not be carried out.
 struct RegistrationProblem {

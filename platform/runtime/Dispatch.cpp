@@ -23,11 +23,12 @@ struct GlobalQueue::State {
       if (waiting.empty()) {
         return;
       }
-      const std::function<void()> work = std::move(waiting.front());
+      std::function<void()> work = std::move(waiting.front());
       waiting.pop_front();
       busy = true;
       lock.unlock();
       work();
+      work = nullptr;  // what it held may queue more as it goes
       lock.lock();
       busy = false;
       changed.notify_all();

@@ -54,7 +54,7 @@ decltype(auto) receive(TravelArgument<T> argument) {
     return Value(argument);
   } else if constexpr (kIsReference<Value> ||
                        (kIsObjectPointer<Value> && !std::is_same_v<Value, Class*>)) {
-    using Target = std::remove_pointer_t<decltype(std::declval<Value>().operator->())>;
+    using Target = std::remove_reference_t<decltype(*std::declval<Value>())>;
     if (argument != nullptr && !isA<Target>(argument)) {
       raiseWrongClass(argument, Target::className);
     }
@@ -131,7 +131,8 @@ class Super {
 
   template <class R, class... A>
   R send(const A&... arguments) const {
-    if (const Method* const replaced = running_->replaced) {
+    const Method* const replaced = running_->replaced;
+    if (replaced != nullptr && replaced->implementation != nullptr) {  // not taken away since
       const DispatchTable::Slot slot{replaced->selector.hash(), replaced->signature.hash,
                                      replaced->implementation, replaced};
       return message::invoke<R>(receiver_, &slot, replaced->selector, arguments...);
@@ -264,6 +265,9 @@ ClassBuilder defineClass() {
   ClassDeclaration declaration{.name = T::className, .superclass = Superclass::className};
   if constexpr (std::is_default_constructible_v<T>) {
     declaration.create = []() -> Object* { return new T; };
+  } else {
+    // Not what the superclass would make: T's methods need a T.
+    declaration.create = []() -> Object* { return nullptr; };
   }
   return ClassBuilder(std::move(declaration));
 }

@@ -41,7 +41,7 @@ class Name {
  private:
   constexpr Name(std::uint64_t hash, const char* text) : hash_(hash), text_(text) {}
 
-  std::uint64_t hash_ = 0;
+  std::uint64_t hash_ = hashOf({});
   const char* text_ = "";
 };
 

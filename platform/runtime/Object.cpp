@@ -17,14 +17,14 @@ struct ObjectExtras {
 Object::~Object() = default;
 
 void Object::destroy() {
-  if (ObjectExtras* const extras = extras_) {
+  // More than once when the destructor of an attached value attaches another.
+  while (ObjectExtras* const extras = std::exchange(extras_, nullptr)) {
     if (WeakSlot* const weak = extras->weak) {
       weak->object = nullptr;
       if (--weak->references == 0) {
         delete weak;
       }
     }
-    extras_ = nullptr;
     delete extras;
   }
   delete this;

@@ -27,6 +27,16 @@ void loadTree(UIView& view, bool again) {
 
 void loadAccessibilityInformation(UIView& view) { loadTree(view, false); }
 
+void forgetAccessibilityInformation(UIView& view) {
+  if (UIViewController* const controller = view.controller()) {
+    accessibilityAttributes(*controller).informationLoaded = false;
+  }
+  accessibilityAttributes(view).informationLoaded = false;
+  for (const Ref<UIView>& child : view.subviewList()) {
+    forgetAccessibilityInformation(*child);
+  }
+}
+
 void reloadAccessibilityInformation() {
   if (UIWindow* const window = UIWindow::keyWindow()) {
     loadTree(*window, true);

@@ -28,7 +28,11 @@ Ref<NSArray> CALayer::sublayers() const {
 }
 
 void CALayer::addSublayer(const Ref<CALayer>& layer) {
-  if (!layer || layer->superlayer_ != nullptr || layer.get() == this) {
+  bool isInside = false;
+  for (const CALayer* above = this; above != nullptr; above = above->superlayer_) {
+    isInside = isInside || above == layer.get();
+  }
+  if (!layer || layer->superlayer_ != nullptr || isInside) {
     raise(kInvalidArgumentException, "a layer is added once, to one other layer");
   }
   layer->superlayer_ = this;
@@ -38,7 +42,10 @@ void CALayer::addSublayer(const Ref<CALayer>& layer) {
 Ref<UIView> CALayer::view() const { return Ref<UIView>(view_); }
 
 CGRect CALayer::naturalFrame() {
-  CGRect rect = frame();
+  if (view_ != nullptr) {
+    return view_->naturalFrame();
+  }
+  CGRect rect = frame_;
   for (CALayer* above = superlayer_; above != nullptr; above = above->superlayer_) {
     if (above->view_ != nullptr) {
       return UIAccessibilityConvertFrameToScreenCoordinates(rect, above->view());

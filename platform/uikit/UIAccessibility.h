@@ -131,6 +131,8 @@ CGRect UIAccessibilityConvertFrameToScreenCoordinates(const CGRect& rect, const 
 /// Sends the load hook once to every view and controller below a view that is on screen now.
 /// Called by views when they appear; an exception of one object does not keep the others from it.
 void loadAccessibilityInformation(UIView& view);
+/// Counts everything at and below a view as never loaded.
+void forgetAccessibilityInformation(UIView& view);
 /// Sends the load hook again to everything on screen: after an installation, or when the screen or
 /// the language changed.
 void reloadAccessibilityInformation();

@@ -39,7 +39,7 @@ class UIView : public NSObject {
   [[nodiscard]] Ref<CALayer> layer();
   void addSubview(const Ref<UIView>& view);
   void removeFromSuperview();
-  /// Whether the view is below a window.
+  /// Whether the view is below the key window.
   [[nodiscard]] bool isOnScreen() const;
 
   void setNeedsLayout() { needsLayout_ = true; }

@@ -1,5 +1,9 @@
 #include "platform/uikit/UIViewController.h"
 
+#include <algorithm>
+
+#include "platform/foundation/Language.h"
+
 namespace tavro {
 namespace {
 
@@ -13,7 +17,9 @@ const Registered itemClass =
         .method<&UIBarButtonItem::naturalLabel>("_naturalAccessibilityLabel")
         .method<&UIBarButtonItem::naturalTraits>("_naturalAccessibilityTraits")
         .method<&UIBarButtonItem::naturalElements>("_naturalAccessibilityElements")
-        .method<&UIBarButtonItem::naturalActivate>("_naturalAccessibilityActivate");
+        .method<&UIBarButtonItem::naturalActivate>("_naturalAccessibilityActivate")
+        .method<&UIBarButtonItem::naturalFrame>("_naturalAccessibilityFrame")
+        .method<&UIBarButtonItem::naturalContainer>("_naturalAccessibilityContainer");
 
 const Registered navigationItemClass =
     defineClass<UINavigationItem, NSObject>()
@@ -61,6 +67,19 @@ bool UIBarButtonItem::naturalActivate() {
   return true;
 }
 
+void UIBarButtonItem::place(const Ref<UIView>& bar, CGRect frame) {
+  bar_ = bar;
+  frame_ = frame;
+  if (customView_) {
+    customView_->setFrame(frame);
+    bar->addSubview(customView_);
+  }
+}
+
+CGRect UIBarButtonItem::naturalFrame() {
+  return UIAccessibilityConvertFrameToScreenCoordinates(frame_, bar_.strong());
+}
+
 id UINavigationItem::rightBarButtonItem() const {
   return rightItems.empty() ? id() : id(rightItems.front());
 }
@@ -72,6 +91,28 @@ void UINavigationBar::setItem(const Ref<UINavigationItem>& item) {
   titleLabel_ = makeView<UILabel>();
   titleLabel_->setText(item->title);
   accessibilityAttributes(*titleLabel_).traits = UIAccessibilityTraitHeader;
+  addSubview(titleLabel_);
+  placeItems();
+}
+
+void UINavigationBar::placeItems() {
+  constexpr double itemWidth = 80;
+  const CGSize size = frame().size;
+  const bool mirrored = userInterfaceIsRightToLeft();
+  const auto span = [&](double x, double width) {
+    return CGRect(mirrored ? size.width - x - width : x, 0, width, size.height);
+  };
+  double left = 0;
+  for (const Ref<UIBarButtonItem>& item : item_->leftItems) {
+    item->place(Ref<UIView>(this), span(left, itemWidth));
+    left += itemWidth;
+  }
+  double right = size.width;
+  for (auto item = item_->rightItems.rbegin(); item != item_->rightItems.rend(); ++item) {
+    right -= itemWidth;
+    (*item)->place(Ref<UIView>(this), span(right, itemWidth));
+  }
+  titleLabel_->setFrame(span(left, std::max(0.0, right - left)));
 }
 
 id UINavigationBar::naturalElements() {
@@ -129,7 +170,11 @@ UIWindow::~UIWindow() {
   }
 }
 
-void UIWindow::makeKey() { keyWindowOfProcess = this; }
+void UIWindow::makeKey() {
+  keyWindowOfProcess = this;
+  layoutIfNeeded();
+  loadAccessibilityInformation(*this);
+}
 
 void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
   const std::vector<Ref<UIView>> shown = subviewList();
@@ -145,9 +190,12 @@ void UIWindow::setRootViewController(const Ref<UIViewController>& controller) {
   const bool hasBar = item->title || !item->leftItems.empty() || !item->rightItems.empty();
   const CGSize size = frame().size;
   const double top = hasBar ? navigationBarHeight : 0;
+  // A screen that comes back is annotated anew, its bar's views too.
+  forgetAccessibilityInformation(*content);
   if (hasBar) {
     const auto bar = makeView<UINavigationBar>({0, 0, size.width, top});
     bar->setItem(item);
+    forgetAccessibilityInformation(*bar);
     addSubview(bar);
   }
   content->setFrame({0, top, size.width, size.height - top});

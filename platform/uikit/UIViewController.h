@@ -20,18 +20,24 @@ class UIBarButtonItem : public NSObject {
   /// A view shown in the item's place, or nil.
   [[nodiscard]] Ref<UIView> customView() const { return customView_; }
   void setCustomView(const Ref<UIView>& view) { customView_ = view; }
+  /// Tells the item where its bar shows it, in the bar's coordinates.
+  void place(const Ref<UIView>& bar, CGRect frame);
 
   bool naturalIsElement() { return !customView_; }
   id naturalLabel() { return title_; }
   UIAccessibilityTraits naturalTraits() { return UIAccessibilityTraitButton; }
   id naturalElements();
   bool naturalActivate();
+  CGRect naturalFrame();
+  id naturalContainer() { return bar_.strong(); }
 
  private:
   Ref<NSString> title_;
   Name action_;
   Weak<> target_;
   Ref<UIView> customView_;
+  Weak<UIView> bar_;
+  CGRect frame_;
 };
 
 /// What a screen shows in the navigation bar. Messages: `title`, `rightBarButtonItem` (the first of
@@ -50,8 +56,8 @@ class UINavigationItem : public NSObject {
   Ref<NSString> titleText() { return title; }
 };
 
-/// Shows a navigation item: its left items, its title as a heading, its right items. A bar hands
-/// out its items itself, since they are not views.
+/// Shows a navigation item: its left items, its title as a heading, its right items, placed when
+/// the item is set. A bar hands out its items itself, since they are not views.
 class UINavigationBar : public UIView {
  public:
   static constexpr Name className = "UINavigationBar";
@@ -60,6 +66,8 @@ class UINavigationBar : public UIView {
   id naturalElements();
 
  private:
+  void placeItems();
+
   Ref<UINavigationItem> item_;
   Ref<UILabel> titleLabel_;
 };

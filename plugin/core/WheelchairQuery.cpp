@@ -18,7 +18,7 @@ std::atomic<bool> usesWheelchair = false;
 /// as one that answers with an error.
 void query() {
   AXPerformSafeBlock([] {
-    const auto store = make<HKHealthStore>();
+    const id store = send<id>(Class::named("HKHealthStore"), "new");
     id error;
     const id answer = send<id>(store, "wheelchairUseWithError:", &error);
     if (!error) {

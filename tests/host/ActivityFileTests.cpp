@@ -5,9 +5,9 @@
 
 #include "host/ActivityFile.h"
 #include "host/screens/workouts/WorkoutRecords.h"
+#include "platform/foundation/NSBundle.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/Settings.h"
-#include "platform/foundation/NSBundle.h"
 
 namespace tavro {
 namespace {

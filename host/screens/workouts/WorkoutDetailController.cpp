@@ -98,11 +98,7 @@ void appendMapAndWeather(UITableView& table, const WorkoutDetail& detail) {
 
 /// From top to bottom.
 constexpr WorkoutDetailSection kSections[] = {
-    &appendTotals,
-    &appendPace,
-    &appendSplits,
-    &appendHeartRate,
-    &appendMapAndWeather,
+    &appendTotals, &appendPace, &appendSplits, &appendHeartRate, &appendMapAndWeather,
 };
 
 }  // namespace
