@@ -224,17 +224,16 @@ TEST_F(MessageTests, SelectorsMayBeMadeAtRunTime) {
   EXPECT_FALSE(respondsTo(nullptr, "integer"));
 }
 
-TEST_F(MessageTests, ClassObjectsAnswerWhatTheRootClassCanSayOfAnyReceiver) {
+TEST_F(MessageTests, ClassObjectsAnswerNoInstanceMethods) {
+  // Code of the root class needs an instance of it, which a class object is not.
   Class* const isa = classOf<Traveller>();
-  EXPECT_EQ(utf8(send<id>(isa, "description")), "MessageTestTraveller");
-  EXPECT_EQ(send<id>(isa, "init"), id(isa));
-  EXPECT_TRUE(send<bool>(isa, "respondsToSelector:", Name("new")));
-  EXPECT_FALSE(send<bool>(isa, "respondsToSelector:", Name("integer")));
-  // The attributes' code needs an NSObject, which a class object is not.
-  for (const Name selector : {Name("accessibilityLabel"), Name("accessibilityElements")}) {
+  for (const Name selector :
+       {Name("description"), Name("accessibilityLabel"), Name("accessibilityElements")}) {
     EXPECT_TRUE(holds(raisedBy([&] { send<id>(isa, selector); }), "unrecognized selector"));
     EXPECT_TRUE(holds(raisedBy([&] { send<id>(classOf<NSObject>(), selector); }), "unrecognized"));
+    EXPECT_FALSE(respondsTo(isa, selector));
   }
+  EXPECT_TRUE(respondsTo(isa, "new"));
   EXPECT_FALSE(as<NSObject>(id(isa)));
   EXPECT_TRUE(as<NSObject>(traveller));
 }

@@ -13,7 +13,7 @@ using Utterances = std::vector<std::string>;
 /// A row whose host answers what a test wants it to answer.
 class OddRow : public CHWorkoutsListTableViewCell {
  public:
-  static constexpr Name className = "OddRow";
+  static constexpr Name className = "OddWorkoutRow";
   id answer;
   id oddWorkout() { return answer; }
 };

@@ -154,7 +154,8 @@ TEST(Narrel, ReadsTouchesAndNamesContainers) {
   EXPECT_EQ(run({"read", "day", "--headings"}),
             "Wednesday, March 11, heading\n"
             "Move, 609/500KCAL, heading\n"
-            "Exercise, 46/30MIN, heading\n");
+            "Exercise, 46/30MIN, heading\n"
+            "Stand, 8/12HRS, heading\n");
   EXPECT_EQ(run({"touch", "day", "--at", "200,350"}), "12\u2009–\u20093\u202FPM, 91 calories\n");
   EXPECT_EQ(run({"touch", "day", "--at", "200,20.5"}), "Wednesday, March 11, heading\n");
   const std::string entered = run({"read", "day", "--verbosity", "containers"});

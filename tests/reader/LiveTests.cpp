@@ -134,7 +134,9 @@ TEST(Live, KeysMoveTheCursorAndSayWhereItIs) {
       {kUp, "not adjustable"},
       {"\n", "nothing happens"},
       {"h", "Exercise, 46/30MIN, heading"},
+      {"h", "Stand, 8/12HRS, heading"},
       {"h", "no further heading"},
+      {"H", "Exercise, 46/30MIN, heading"},
       {"H", "Move, 609/500KCAL, heading"},
       {"HH", "Wednesday, March 11, heading"},
   };
