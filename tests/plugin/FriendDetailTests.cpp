@@ -181,9 +181,9 @@ TEST_F(FriendDetailTest, TheInboxButtonSaysWhatItsBadgeCounts) {
       {"en_US", " 3", ""},
       {"en_US", "3.7", "3 new items"},
       {"en_US", "0.9", ""},
-      {"de_DE", "3,7", "3 new items"},
+      {"de_DE", "3,7", "3 neue Einträge"},
       {"de_DE", "3.7", ""},
-      {"ar_EG", "٣", "3 new items"},
+      {"ar_EG", "٣", "3 عناصر جديدة"},
       {"en_US", "99999999999", "2147483647 new items"},
   };
   const auto button = makeView<CHFriendInboxBarButtonView>();

@@ -104,9 +104,10 @@ TEST_F(RingDescriptionTest, PerCentsFollowTheLocale) {
     const char* expected;
   };
   const Case cases[] = {
-      {"de_DE", "Calories burned, 50\u00a0%, Exercise minutes, 0\u00a0%, Stand hours, 12\u00a0%"},
-      {"he_IL", "Calories burned, 50%, Exercise minutes, 0%, Stand hours, 12%"},
-      {"ar_EG", "Calories burned, ٥٠٪\u061c, Exercise minutes, ٠٪\u061c, Stand hours, ١٢٪\u061c"},
+      {"de_DE",
+       "Verbrannte Kalorien, 50\u00a0%, Trainingsminuten, 0\u00a0%, Stehstunden, 12\u00a0%"},
+      {"he_IL", "קלוריות שנשרפו, 50%, דקות אימון, 0%, שעות עמידה, 12%"},
+      {"ar_EG", "السعرات المحروقة, ٥٠٪\u061c, دقائق التمرين, ٠٪\u061c, ساعات الوقوف, ١٢٪\u061c"},
   };
   for (const Case& each : cases) {
     Settings::current().locale = each.locale;

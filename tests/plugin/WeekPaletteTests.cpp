@@ -114,9 +114,9 @@ TEST_F(WeekPaletteTest, WeekdaysAreTheUsersAndTheCachesDaysGregorian) {
     const char* today;
   };
   const Case cases[] = {
-      {"de_DE", "", "Montag, 9", "Today, Mittwoch, 11"},
-      {"he_IL", "", "יום שני, 9", "Today, יום רביעי, 11"},
-      {"he_IL", "hebrew", "יום שני, 9", "Today, יום רביעי, 11"},
+      {"de_DE", "", "Montag, 9", "Heute, Mittwoch, 11"},
+      {"he_IL", "", "יום שני, 9", "היום, יום רביעי, 11"},
+      {"he_IL", "hebrew", "יום שני, 9", "היום, יום רביעי, 11"},
       {"en_US", "islamic", "Monday, 9", "Today, Wednesday, 11"},
   };
   for (const Case& each : cases) {

@@ -331,7 +331,7 @@ TEST_F(CursorTest, ABarsItemsCanBeTouchedAndTapped) {
   window->setRootViewController(controller);
   cursor.update();
   EXPECT_TRUE(cursor.touch({380, 20}));
-  EXPECT_EQ(here(cursor), "Back, button") << "a bar begins on the right";
+  EXPECT_EQ(here(cursor), "Back, زر") << "a bar begins on the right";
 }
 
 TEST_F(CursorTest, ActivationReachesWhatTakesIt) {

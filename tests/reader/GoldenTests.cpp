@@ -22,7 +22,9 @@ struct Golden {
 constexpr Golden kGoldens[] = {
     {"tour.en_US", "en_US", true}, {"tour.en_US.without-plugin", "en_US", false},
     {"tour.de_DE", "de_DE", true}, {"tour.ar_EG", "ar_EG", true},
-    {"tour.ja_JP", "ja_JP", true},
+    {"tour.he_IL", "he_IL", true}, {"tour.ja_JP", "ja_JP", true},
+    {"tour.ru_RU", "ru_RU", true}, {"tour.pl_PL", "pl_PL", true},
+    {"tour.hi_IN", "hi_IN", true}, {"tour.zh_Hans_CN", "zh_Hans_CN", true},
 };
 
 std::string pathOf(const Golden& golden) {

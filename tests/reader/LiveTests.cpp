@@ -149,7 +149,7 @@ TEST(Live, KeysMoveTheCursorAndSayWhereItIs) {
   EXPECT_EQ(session.heardAfter("\033[1;5C"), "no such key, ? for help");
   EXPECT_EQ(session.heardAfter("\033"), "no such key, ? for help");
   EXPECT_EQ(session.heardAfter("l"), "Deutsch (Deutschland)");
-  EXPECT_EQ(session.line(), "Mittwoch, 11. März, heading");
+  EXPECT_EQ(session.line(), "Mittwoch, 11. März, Überschrift");
   EXPECT_EQ(session.heardAfter("l"), "English (United States)");
   EXPECT_EQ(session.line(), "Wednesday, March 11, heading");
   session.press("q");
@@ -225,7 +225,7 @@ TEST_F(LiveSpeech, SaysEachUtteranceInItsLanguage) {
       runNarrel({"live", "--speak", "--locale", "de_DE", "--now", "2026-03-11T15:20"});
   EXPECT_EQ(finished.code, 0) << finished.error;
   // The end of the input waits until the last utterance has been spoken.
-  EXPECT_EQ(contentOf(log), "-v|de|--|[day], Mittwoch, 11. März, heading|");
+  EXPECT_EQ(contentOf(log), "-v|de|--|[day], Mittwoch, 11. März, Überschrift|");
 }
 
 TEST_F(LiveSpeech, ANewUtteranceStopsTheOneBeforeIt) {
