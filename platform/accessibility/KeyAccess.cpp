@@ -1,5 +1,6 @@
 #include "platform/accessibility/KeyAccess.h"
 
+#include <algorithm>
 #include <bit>
 #include <memory>
 #include <string>
@@ -217,10 +218,14 @@ Ref<UIView> safeUIViewForKey(const Object* object, Name key) {
 
 id safeValueForKeyPath(const Object* object, std::string_view path) {
   id current(const_cast<Object*>(object));
-  while (current && !path.empty()) {
-    const std::size_t dot = path.find('.');
-    current = safeValueForKey(current.get(), Name::make(path.substr(0, dot)));
-    path = dot == std::string_view::npos ? std::string_view() : path.substr(dot + 1);
+  for (std::size_t start = 0; current && start <= path.size();) {
+    const std::size_t end = std::min(path.find('.', start), path.size());
+    id next;  // stays nil where a key is empty or cannot be a name
+    AXPerformSafeBlock([&] {
+      next = safeValueForKey(current.get(), Name::make(path.substr(start, end - start)));
+    });
+    current = next;
+    start = end + 1;
   }
   return current;
 }
@@ -260,7 +265,7 @@ void __UIAccessibilitySetAssociatedObject(Object* object, AssociationKey key, co
 }
 
 void __UIAccessibilitySetAssociatedCopiedObject(Object* object, AssociationKey key,
-                                                const id& value) {
+                                                const Ref<NSString>& value) {
   __UIAccessibilitySetAssociatedObject(object, key, value);
 }
 

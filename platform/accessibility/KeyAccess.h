@@ -79,6 +79,6 @@ id __UIAccessibilityGetAssociatedObject(const Object* object, AssociationKey key
 void __UIAccessibilitySetAssociatedObject(Object* object, AssociationKey key, const id& value);
 /// Stores a copy; strings are immutable, so a string is its own copy.
 void __UIAccessibilitySetAssociatedCopiedObject(Object* object, AssociationKey key,
-                                                const id& value);
+                                                const Ref<NSString>& value);
 
 }  // namespace tavro

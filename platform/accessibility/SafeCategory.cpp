@@ -17,7 +17,7 @@ constexpr Name kOwnMethods[] = {"safeCategoryTargetClassName", "safeCategoryBase
 /// Grafts one method unless it would change what callers of the target pass or get.
 GraftOutcome graft(Class* target, const Method& method, Class* category) {
   GraftOutcome outcome{std::string(method.selector.text()), target->isMetaclass(), false, {}};
-  const Method* const existing = target->method(method.selector);
+  const Method* const existing = target->methodWithoutTable(method.selector);
   if (existing != nullptr && existing->signature != method.signature) {
     outcome.reason = "the host's method has the signature " +
                      std::string(existing->signature.encodings) + ", the category's " +
@@ -43,7 +43,7 @@ void graftAll(Class* target, Class* methods, Class* category, std::vector<GraftO
 
 namespace safe_category {
 
-id baseClass(Class* /*category*/) { return id(Class::named("UIAccessibilitySafeCategory")); }
+Class* baseClass(Class* /*category*/) { return Class::named("UIAccessibilitySafeCategory"); }
 
 Name declareSuperclass(Name category) {
   const Name name = Name::make("__" + std::string(category.text()) + "_super");

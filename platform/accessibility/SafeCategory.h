@@ -43,11 +43,13 @@ template <class T>
 id targetClassName(Class* /*category*/) {
   return string(T::target.text());
 }
-id baseClass(Class* category);
+Class* baseClass(Class* category);
 template <const auto& Contract>
 void performValidations(Class* /*category*/, Ref<AXValidationManager> manager) {
   for (const HostCheck& check : Contract) {
-    manager->validate(check);
+    if (manager) {
+      manager->validate(check);
+    }
   }
 }
 /// Declares `__X_super` for a category X and yields its name.

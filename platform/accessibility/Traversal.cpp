@@ -125,7 +125,7 @@ class TextWalk {
     if (isIncluded) {
       texts.push_back(accessibilityLabelOf(object));
     }
-    if (!isHeader && !isElement) {
+    if (!isElement) {
       visitChildren(object);
     }
   }

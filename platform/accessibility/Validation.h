@@ -105,11 +105,11 @@ using InstallationHandler = std::function<void(id)>;
 /// with the four handlers above, any of which may be empty; `setValidationTargetName:`,
 /// `setOverrideProcessName:` (strings), `setDebugBuild:` (boolean).
 ///
-/// Order: the pre-validation handler, which decides whether checks run; if they do, the process-wide
-/// checks; the installation handler, which only names categories; if checks run, each named
-/// category's own; then the categories are installed in the order in which they were named; then the
-/// post-validation handler. No method is grafted before all checks ran, so that they see the bare
-/// host.
+/// Order: the pre-validation handler, which decides whether checks run; if they do, the
+/// process-wide checks; the installation handler, which only names categories; if checks run, each
+/// named category's own; then the categories are installed in the order in which they were named;
+/// then the post-validation handler. No method is grafted before all checks ran, so that they see
+/// the bare host.
 class AXValidationManager : public NSObject {
  public:
   static constexpr Name className = "AXValidationManager";

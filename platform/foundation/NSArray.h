@@ -14,6 +14,7 @@ class NSArray : public NSObject {
   static constexpr Name className = "NSArray";
 
   [[nodiscard]] std::size_t count() const { return objects_.size(); }
+  /// Unchecked: the index must lie within the list.
   [[nodiscard]] const id& operator[](std::size_t index) const { return objects_[index]; }
   [[nodiscard]] auto begin() const { return objects_.begin(); }
   [[nodiscard]] auto end() const { return objects_.end(); }

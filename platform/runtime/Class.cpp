@@ -56,6 +56,17 @@ Object* Class::allocate() {
   return nullptr;
 }
 
+const Method* Class::methodWithoutTable(Name selector) const {
+  for (const Class* each = this; each != nullptr; each = each->superclass_) {
+    for (auto method = each->methods_.rbegin(); method != each->methods_.rend(); ++method) {
+      if (method->selector == selector && method->implementation != nullptr) {
+        return &*method;
+      }
+    }
+  }
+  return nullptr;
+}
+
 std::vector<const Method*> Class::ownMethods() const {
   std::vector<const Method*> own;
   for (const Method& method : methods_) {

@@ -115,6 +115,8 @@ class Class final : public Object {
     const DispatchTable::Slot* slot = lookup(selector);
     return slot == nullptr ? nullptr : slot->method;
   }
+  /// The same without building the class's table: for lookups between changes.
+  [[nodiscard]] const Method* methodWithoutTable(Name selector) const;
   /// This class's own methods, replaced ones left out, in the order of their declaration.
   [[nodiscard]] std::vector<const Method*> ownMethods() const;
 

@@ -84,8 +84,7 @@ struct AccessibilityAttributes {
 /// The object's attributes, made when absent.
 AccessibilityAttributes& accessibilityAttributes(NSObject& object);
 
-/// An element that stands for something drawn. Held weakly by nobody but its list; its container
-/// is held weakly.
+/// An element that stands for something drawn. Its list holds it; it holds its container weakly.
 class UIAccessibilityElement : public NSObject {
  public:
   static constexpr Name className = "UIAccessibilityElement";

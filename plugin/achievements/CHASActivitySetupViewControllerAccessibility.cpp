@@ -16,7 +16,7 @@ class CHASActivitySetupViewControllerAccessibility : public SafeCategory {
   // One body for all three: each continues in the host's method of the message that was sent.
   void presentGoal() {
     super.send<void>();
-    send<void>(self, "_accessibilityUpdateCurrentPresentedView");
+    trySend<void>(self, "_accessibilityUpdateCurrentPresentedView");
   }
 
   void _accessibilityUpdateCurrentPresentedView() {

@@ -18,19 +18,19 @@ class CHAchievementDetailViewControllerAccessibility : public SafeCategory {
     const auto label = typedRead<UILabel>(self, "label");
     const Ref<NSString> text = safeStringForKey(label, "text");
     if (lengthOfText(text) > 0) {
-      send<void>(label, "setAccessibilityLabel:",
+      trySend<void>(label, "setAccessibilityLabel:",
                  AXLabelForElements(componentsSeparatedByNewlines(*text)));
     }
   }
 
   void _accessibilityLoadAccessibilityInformation() {
     super.send<void>();
-    send<void>(self, "_axAnnotateAchievementView");
+    trySend<void>(self, "_axAnnotateAchievementView");
   }
 
   void viewDidLoad() {
     super.send<void>();
-    send<void>(self, "_axAnnotateAchievementView");
+    trySend<void>(self, "_axAnnotateAchievementView");
   }
 
  private:
@@ -42,12 +42,12 @@ class CHAchievementDetailViewControllerAccessibility : public SafeCategory {
       return;
     }
     const Ref<UIView> badge = safeUIViewForKey(self, "badgeContainer");
-    send<void>(badge, "setIsAccessibilityElement:", true);
-    send<void>(badge, "setAccessibilityLabel:",
+    trySend<void>(badge, "setIsAccessibilityElement:", true);
+    trySend<void>(badge, "setAccessibilityLabel:",
                stringWithFormat(localized("achievement.badge.format"), {id(title)}));
     // The badge is drawn by other means, and its container may count as hidden meanwhile.
-    send<void>(badge, "_accessibilitySetViewIsVisible:", true);
-    send<void>(badge, "_accessibilitySetOverridesInvisibility:", true);
+    trySend<void>(badge, "_accessibilitySetViewIsVisible:", true);
+    trySend<void>(badge, "_accessibilitySetOverridesInvisibility:", true);
   }
 };
 

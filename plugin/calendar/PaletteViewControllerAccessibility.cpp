@@ -13,7 +13,7 @@ class PaletteViewControllerAccessibility : public SafeCategory {
 
   void viewDidLoad() {
     super.send<void>();
-    send<void>(self, "_accessibilityLoadAccessibilityInformation");
+    trySend<void>(self, "_accessibilityLoadAccessibilityInformation");
   }
 
   void _accessibilityLoadAccessibilityInformation() {

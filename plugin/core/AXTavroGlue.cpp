@@ -69,8 +69,10 @@ constexpr HostCheck kProcessContract[] = {
 };
 
 bool checkProcess(const id& manager) {
-  for (const HostCheck& check : kProcessContract) {
-    as<AXValidationManager>(manager)->validate(check);
+  if (const auto validating = as<AXValidationManager>(manager)) {
+    for (const HostCheck& check : kProcessContract) {
+      validating->validate(check);
+    }
   }
   return true;
 }

@@ -11,14 +11,13 @@ namespace {
 id makeProvider() {
   id provider;
   AXPerformSafeBlock([&] {
-    const id made = send<id>(
+    provider = send<id>(
         send<id>(AXSafeClassFromString("AAUIAchievementLocalizationProvider"), "alloc"), "init");
-    id name;
-    AXPerformSafeBlock([&] { name = callFunction<id>("TVUICopyUserFirstNameFromAddressBook"); });
-    send<void>(made, "setName:", name);
-    send<void>(made, "setWheelchairUser:", _userIsWheelchairUserWithNarrelOn());
-    provider = made;
   });
+  id name;
+  AXPerformSafeBlock([&] { name = callFunction<id>("TVUICopyUserFirstNameFromAddressBook"); });
+  trySend<void>(provider, "setName:", name);
+  trySend<void>(provider, "setWheelchairUser:", _userIsWheelchairUserWithNarrelOn());
   return provider;
 }
 

@@ -44,8 +44,10 @@ void addDayParts(NSMutableArray& elements, const Ref<UIView>& chart, const DayPa
   }
 }
 
-float amountOfPoint(const id& point) {
-  return static_cast<float>(trySend<CGPoint>(point, "CGPointValue").y);
+float amountAt(const NSArray& points, std::size_t index) {
+  return index < points.count()
+             ? static_cast<float>(trySend<CGPoint>(points[index], "CGPointValue").y)
+             : 0;
 }
 
 Ref<NSArray> descendantsOfClass(Object* view, Name className) {

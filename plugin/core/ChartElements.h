@@ -55,8 +55,9 @@ struct DayParts {
 void addDayParts(NSMutableArray& elements, const Ref<UIView>& chart, const DayParts& parts,
                  const std::function<id(std::size_t)>& valueOf);
 
-/// The y of a chart's point; 0 for what is not a point.
-float amountOfPoint(const id& point);
+/// The y of a chart's point; 0 for what is not a point, and past the end: the points are the host's
+/// own list, which may change at any time.
+float amountAt(const NSArray& points, std::size_t index);
 
 /// The views below a view that are of that class, in tree order; empty when there is no such class.
 Ref<NSArray> descendantsOfClass(Object* view, Name className);

@@ -12,10 +12,10 @@ constexpr std::size_t kSlices = 8;
 constexpr double kSecondsPerSlice = 10800;
 constexpr float kSliceShare = 0.125F;
 
-/// The chart types of the host.
+/// The chart types of the host: energy, and two kinds of minutes.
 constexpr std::int32_t kActiveEnergy = 0;
 constexpr std::int32_t kMinutes = 1;
-constexpr std::int32_t kMoveMinutes = 2;
+constexpr std::int32_t kOtherMinutes = 2;
 
 /// What a slice's total is called; asked once a build.
 class AmountSpeech {
@@ -23,7 +23,7 @@ class AmountSpeech {
   explicit AmountSpeech(std::int32_t chartType) : type_(chartType) {
     if (type_ == kActiveEnergy) {
       format_ = localized("calories.format");
-    } else if (type_ == kMinutes || type_ == kMoveMinutes) {
+    } else if (type_ == kMinutes || type_ == kOtherMinutes) {
       format_ = localized("minutes.format");
     }
   }
@@ -42,8 +42,8 @@ class AmountSpeech {
 
 float sumOfPoints(const NSArray& points, std::size_t first, std::size_t end) {
   float sum = 0;
-  for (std::size_t index = first; index < end && index < points.count(); ++index) {
-    sum += amountOfPoint(points[index]);
+  for (std::size_t index = first; index < end; ++index) {
+    sum += amountAt(points, index);
   }
   return sum;
 }
@@ -65,7 +65,7 @@ class ActivityMoveAndExerciseChartViewAccessibility : public SafeCategory {
     loadGraphData(self, "moveAndExerciseChartPoints", "NSValue", kDayViewGraphElements);
   }
 
-  // The host's own reload would describe the chart as one value; it is replaced, not continued.
+  // Replaces the host's method, which is not continued.
   void accessibilityReloadData() { send<void>(self, "_accessibilityLoadAccessibilityInformation"); }
 
   id _accessibilityGraphData() { return _accessibilityValueForKey(self, kDayViewGraphElements); }
@@ -73,7 +73,7 @@ class ActivityMoveAndExerciseChartViewAccessibility : public SafeCategory {
  private:
   void build(NSMutableArray& elements) {
     const auto chart = as<UIView>(self);
-    const auto points = as<NSArray>(send<id>(self, "_accessibilityGraphData"));
+    const auto points = as<NSArray>(trySend<id>(self, "_accessibilityGraphData"));
     if (!chart || !points) {
       return;
     }

@@ -16,7 +16,7 @@ class ActivityStandChartViewAccessibility : public SafeCategory {
   static constexpr Name target = "TavroApp.ActivityStandChartView";
 
   id accessibilityElements() {
-    const auto points = as<NSArray>(send<id>(self, "_accessibilityGraphData"));
+    const auto points = as<NSArray>(trySend<id>(self, "_accessibilityGraphData"));
     return elementsBuiltOnce(self, points ? points->count() : 0, [&](NSMutableArray& elements) {
       if (points) {
         build(elements, *points);
@@ -43,9 +43,8 @@ class ActivityStandChartViewAccessibility : public SafeCategory {
                                   static_cast<float>(points.count()));
     const Ref<NSString> active = localized("stand.goal.active");
     const Ref<NSString> inactive = localized("stand.goal.inactive");
-    addDayParts(
-        elements, chart, {points.count(), kSecondsPerHour, "ha", {width, height}},
-        [&](std::size_t hour) { return amountOfPoint(points[hour]) > 0 ? active : inactive; });
+    addDayParts(elements, chart, {points.count(), kSecondsPerHour, "ha", {width, height}},
+                [&](std::size_t hour) { return amountAt(points, hour) > 0 ? active : inactive; });
   }
 };
 

@@ -12,7 +12,7 @@ class CHFriendInboxTableViewControllerAccessibility : public SafeCategory {
 
   void viewDidLoad() {
     super.send<void>();
-    send<void>(self, "_accessibilityLoadAccessibilityInformation");
+    trySend<void>(self, "_accessibilityLoadAccessibilityInformation");
   }
 
   void _accessibilityLoadAccessibilityInformation() {

@@ -26,7 +26,7 @@ class CHFriendListTableViewCellAccessibility : public SafeCategory {
   // Rows are reused, so each friend that a row is filled with is a new label.
   void setFriend(const id& person, const id& snapshot, const id& formattingManager, bool animated) {
     super.send<void>(person, snapshot, formattingManager, animated);
-    send<void>(self, "_accessibilityLoadAccessibilityInformation");
+    trySend<void>(self, "_accessibilityLoadAccessibilityInformation");
   }
 
   void _accessibilityLoadAccessibilityInformation() {
@@ -38,13 +38,13 @@ class CHFriendListTableViewCellAccessibility : public SafeCategory {
     const id badge = safeValueForKey(self, "competitionBadgeView");
     trySend<void>(badge, "setIsAccessibilityElement:", true);
     trySend<void>(badge, "setAccessibilityLabel:", localized("competition.in.progress"));
-    send<void>(name, "_setAccessibilityLabelBlock:", LabelBlock([name = Weak<>(name.get())] {
+    trySend<void>(name, "_setAccessibilityLabelBlock:", LabelBlock([name = Weak<>(name.get())] {
                  return nameWithoutBullets(name.strong());
                }));
     const Ref<NSArray> parts =
         axArrayByIgnoringNilElements({name, safeValueForKey(self, "detailLineOneLabel"),
                                       safeValueForKey(self, "detailLineTwoLabel"), badge});
-    send<void>(self, "setAccessibilityLabel:", AXLabelForElements(parts));
+    trySend<void>(self, "setAccessibilityLabel:", AXLabelForElements(parts));
   }
 };
 

@@ -14,17 +14,17 @@ class CHFriendListViewControllerAccessibility : public SafeCategory {
 
   void viewDidLoad() {
     super.send<void>();
-    send<void>(self, "_accessibilityLoadAccessibilityInformation");
+    trySend<void>(self, "_accessibilityLoadAccessibilityInformation");
   }
 
   void _accessibilityLoadAccessibilityInformation() {
     super.send<void>();
     const auto button = typedRead<UIBarButtonItem>(self, "_sortBarButtonItem");
     // Blocks rather than texts: the host changes the title whenever the order changes.
-    send<void>(button, "_setAccessibilityLabelBlock:", LabelBlock([] {
+    trySend<void>(button, "_setAccessibilityLabelBlock:", LabelBlock([] {
                  return localized("sort.by.options");
                }));
-    send<void>(button, "_setAccessibilityValueBlock:", LabelBlock([button = Weak<>(button.get())] {
+    trySend<void>(button, "_setAccessibilityValueBlock:", LabelBlock([button = Weak<>(button.get())] {
                  return safeStringForKey(button.strong(), "title");
                }));
   }

@@ -21,14 +21,14 @@ class TrendChartCategory : public SafeCategory {
 
   void layoutSubviews() {
     super.template send<void>();
-    send<void>(self, "_accessibilityLoadAccessibilityInformation");
+    trySend<void>(self, "_accessibilityLoadAccessibilityInformation");
   }
 
   id _accessibilityGraphData() { return _accessibilityValueForKey(self, Chart::kGraphElements); }
 
  protected:
   /// The stops of the last load; nil when they were of no use.
-  Ref<NSArray> stops() { return as<NSArray>(send<id>(self, "_accessibilityGraphData")); }
+  Ref<NSArray> stops() { return as<NSArray>(trySend<id>(self, "_accessibilityGraphData")); }
 };
 
 /// A trend's chart while its element list is built: its title label, marked as a header, comes
@@ -55,7 +55,7 @@ class TrendChart {
 /// that the host has taken away since.
 float stopAt(const NSArray& stops, std::size_t index);
 
-/// Says values with their unit; made once a build, since its words stay the same.
+/// Says values with their unit; made once for several, since its words stay the same.
 class ValueWithUnitSpeech {
  public:
   ValueWithUnitSpeech();

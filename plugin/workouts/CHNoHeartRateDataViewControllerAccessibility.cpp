@@ -15,7 +15,7 @@ class CHNoHeartRateDataViewControllerAccessibility : public SafeCategory {
 
   void loadView() {
     super.send<void>();
-    send<void>(self, "_accessibilityLoadAccessibilityInformation");
+    trySend<void>(self, "_accessibilityLoadAccessibilityInformation");
   }
 
   void _accessibilityLoadAccessibilityInformation() {
@@ -23,7 +23,7 @@ class CHNoHeartRateDataViewControllerAccessibility : public SafeCategory {
     AXPerformSafeBlock([this] {
       const id title = safeValueForKey(self, "titleLabel");
       const auto traits = send<UIAccessibilityTraits>(title, "accessibilityTraits");
-      send<void>(title, "setAccessibilityTraits:", traits | UIAccessibilityTraitHeader);
+      trySend<void>(title, "setAccessibilityTraits:", traits | UIAccessibilityTraitHeader);
     });
     trySend<void>(safeValueForKey(self, "linkLabel"), "setIsAccessibilityElement:", false);
     const Weak<> controller(self);

@@ -33,25 +33,25 @@ class CHWorkoutDetailHeartRateChartTableViewCellAccessibility : public SafeCateg
 
   void _createAndConstraintNoDataOverlay() {
     super.send<void>();
-    send<void>(self, "_accessibilityLoadAccessibilityInformation");
+    trySend<void>(self, "_accessibilityLoadAccessibilityInformation");
   }
 
   void _accessibilityLoadAccessibilityInformation() {
     super.send<void>();
     const Ref<UIView> overlay = safeUIViewForKey(self, "_noDataOverlayView");
-    send<void>(overlay,
+    trySend<void>(overlay,
                "_setIsAccessibilityElementBlock:", FlagBlock([held = Weak<UIView>(overlay)] {
                  const Ref<UIView> shown = held.strong();
                  return shown && !shown->isHidden();
                }));
-    send<void>(overlay, "_setAccessibilityLabelBlock:", LabelBlock([held = Weak<UIView>(overlay)] {
+    trySend<void>(overlay, "_setAccessibilityLabelBlock:", LabelBlock([held = Weak<UIView>(overlay)] {
                  return labelOfOverlay(held.strong());
                }));
-    send<void>(
+    trySend<void>(
         overlay, "_setAccessibilityActivateBlock:", FlagBlock([held = Weak<UIView>(overlay)] {
           return trySend<bool>(firstSubview<UIButton>(held.strong()), "accessibilityActivate");
         }));
-    send<void>(overlay, "setAccessibilityTraits:", UIAccessibilityTraitButton);
+    trySend<void>(overlay, "setAccessibilityTraits:", UIAccessibilityTraitButton);
   }
 };
 

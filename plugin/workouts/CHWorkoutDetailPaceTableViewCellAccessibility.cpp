@@ -18,7 +18,7 @@ class CHWorkoutDetailPaceTableViewCellAccessibility : public SafeCategory {
     // Cycling shows a speed, which needs no annotation.
     if (trySend<HKWorkoutActivityType>(workout, "workoutActivityType") !=
         HKWorkoutActivityType::cycling) {
-      send<void>(self, "_accessibilityLoadAccessibilityInformation");
+      trySend<void>(self, "_accessibilityLoadAccessibilityInformation");
     }
   }
 

@@ -21,7 +21,7 @@ class CHWorkoutsListTableViewCellAccessibility : public SafeCategory {
 
   void configureWithCurrentWorkout() {
     super.send<void>();
-    send<void>(self, "_accessibilityLoadAccessibilityInformation");
+    trySend<void>(self, "_accessibilityLoadAccessibilityInformation");
   }
 
   void _accessibilityLoadAccessibilityInformation() {

@@ -297,9 +297,10 @@ TEST_F(KeyAccessTests, RetainedValuesAndAssociatedObjectsStayApart) {
   static const char second = 0;
   const id a = string("a");
   const id b = string("b");
+  const Ref<NSString> copied = string("a");
   _accessibilitySetRetainedValue(holder.get(), a, "kAXTestKey");
   __UIAccessibilitySetAssociatedObject(holder.get(), &first, b);
-  __UIAccessibilitySetAssociatedCopiedObject(holder.get(), &second, a);
+  __UIAccessibilitySetAssociatedCopiedObject(holder.get(), &second, copied);
   EXPECT_EQ(_accessibilityValueForKey(holder.get(), "kAXTestKey"), a);
   EXPECT_EQ(_accessibilityValueForKey(holder.get(), "kAXOtherKey"), nullptr);
   EXPECT_EQ(__UIAccessibilityGetAssociatedObject(holder.get(), &first), b);

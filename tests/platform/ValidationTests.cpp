@@ -194,7 +194,7 @@ TEST_F(ValidationTests, ACategoryIsAClassWithItsThreeMethods) {
   EXPECT_EQ(category->superclass()->name(), Name("__GaugeTestAccessibility_super"));
   Class* const base = category->superclass()->superclass();
   EXPECT_EQ(base->name(), Name("UIAccessibilitySafeCategory"));
-  EXPECT_EQ(send<id>(category, "safeCategoryBaseClass"), id(base));
+  EXPECT_EQ(send<Class*>(category, "safeCategoryBaseClass"), base);
   EXPECT_EQ(utf8(send<id>(category, "safeCategoryTargetClassName")), "ValidationTestGauge");
 }
 

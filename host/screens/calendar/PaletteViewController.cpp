@@ -81,6 +81,9 @@ id PaletteWeekdayHeaderView::initWithNavigationPalette(const Ref<UIView>& palett
 
 void PaletteWeekdayHeaderView::highlightWeekdayLabelForDateAndSetDay(const Ref<NSDate>& date) {
   day_ = date;
+  if (!date) {
+    return;
+  }
   const auto chosen = static_cast<std::size_t>(columnOf(date));
   for (std::size_t column = 0; column < _weekdayLabels->count(); ++column) {
     as<UILabel>((*_weekdayLabels)[column])->setAlpha(column == chosen ? 1 : kDimmed);

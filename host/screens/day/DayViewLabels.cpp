@@ -1,5 +1,7 @@
 #include "host/screens/day/DayViewLabels.h"
 
+#include "platform/foundation/Language.h"
+
 namespace tavro {
 namespace {
 
@@ -25,8 +27,9 @@ void DayViewTitleAndValueLabelPair::setTexts(std::string_view title, std::string
 void DayViewTitleAndValueLabelPair::layoutSubviews() {
   if (titleLabel_) {
     const double half = frame().size.width / 2;
-    titleLabel_->setFrame({0, 0, half, frame().size.height});
-    valueLabel_->setFrame({half, 0, half, frame().size.height});
+    const bool isMirrored = userInterfaceIsRightToLeft();
+    titleLabel_->setFrame({isMirrored ? half : 0, 0, half, frame().size.height});
+    valueLabel_->setFrame({isMirrored ? 0 : half, 0, half, frame().size.height});
   }
 }
 

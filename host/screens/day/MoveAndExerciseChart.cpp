@@ -48,11 +48,16 @@ void ActivityMoveAndExerciseChartView::setAmounts(MoveAndExerciseChartType type,
 
 void ActivityMoveAndExerciseChartView::layoutSubviews() {
   const CGSize size = frame().size;
-  const double width = bars_.empty() ? 0 : size.width / static_cast<double>(bars_.size());
-  for (std::size_t hour = 0; hour < points_->count(); ++hour) {
-    const double amount = as<NSValue>((*points_)[hour])->CGPointValue().y;
+  const std::size_t hours = points_ ? points_->count() : 0;
+  const double width = hours == 0 ? 0 : size.width / static_cast<double>(hours);
+  for (std::size_t bar = 0; bar < bars_.size(); ++bar) {
+    if (bar >= hours) {
+      bars_[bar]->setFrame({});  // left from a longer day
+      continue;
+    }
+    const double amount = as<NSValue>((*points_)[bar])->CGPointValue().y;
     const double height = maximum_ > 0 ? size.height * amount / maximum_ : 0;
-    bars_[hour]->setFrame({static_cast<double>(hour) * width, size.height - height, width, height});
+    bars_[bar]->setFrame({static_cast<double>(bar) * width, size.height - height, width, height});
   }
 }
 

@@ -95,6 +95,9 @@ void CHASActivitySetupViewController::present(const Ref<GoalView>& goalView) {
   _currentlyPresentedView = goalView;
   const auto* const presented =
       std::ranges::find_if(kSteps, [&](const Step& step) { return this->*step.view == goalView; });
+  if (!goalView || presented == std::end(kSteps)) {
+    return;
+  }
   for (const Step& step : kSteps) {
     // Those that were presented wait to the left of the screen, those to come to the right.
     const auto stepsAway = static_cast<double>(&step - presented);
@@ -107,6 +110,9 @@ void CHASActivitySetupViewController::present(const Ref<GoalView>& goalView) {
 void CHASActivitySetupViewController::continueSetup() {
   const auto* const presented = std::ranges::find_if(
       kSteps, [&](const Step& step) { return this->*step.view == _currentlyPresentedView; });
+  if (presented == std::end(kSteps)) {
+    return;
+  }
   if (presented->next.empty()) {
     headline_->setText(string("Your goals are set"));
     continueButton_->setHidden(true);

@@ -40,7 +40,9 @@ void CHASActivitySetupGoalView::setGoal(double goal, std::string_view unit,
                                         const ValueRange& range) {
   _unitLabel->setText(string(unit));
   buttonController_->setValue(goal, range, [label = Weak<UILabel>(_goalLabel)](double value) {
-    label.strong()->setText(decimalString(value, 0));
+    if (const auto shown = label.strong()) {
+      shown->setText(decimalString(value, 0));
+    }
   });
 }
 

@@ -1,5 +1,7 @@
 #include "host/screens/sharing/FriendListViewController.h"
 
+#include "host/screens/sharing/FriendInboxViewController.h"
+
 #include <algorithm>
 
 #include "host/Application.h"
@@ -60,6 +62,13 @@ Ref<UIBarButtonItem> inboxItem(const Diary& diary) {
   const auto button = makeView<CHFriendInboxBarButtonView>({334, 0, 44, 44});
   button->_badgeView->setCount(std::ranges::count(diary.inbox, true, &InboxMessage::unread));
   button->layoutIfNeeded();
+  button->setAction([&diary] {
+    if (UIWindow* const window = UIWindow::keyWindow()) {
+      const auto inbox = makeController<CHFriendInboxTableViewController>();
+      inbox->setMessages(diary.inbox);
+      window->setRootViewController(inbox);
+    }
+  });
   const auto item = make<UIBarButtonItem>();
   item->setCustomView(button);
   return item;

@@ -72,6 +72,9 @@ void CHFriendListTableViewCell::setFriend(const Ref<ASFriend>& person,
                                           const Ref<HKActivitySummary>& snapshot,
                                           const Ref<CHFriendFormattingManager>& formattingManager,
                                           bool /*animated*/) {
+  if (!formattingManager) {
+    return;
+  }
   textLabel()->setText(person ? formattingManager->nameText(*person) : nullptr);
   competitionBadgeView_->setHidden(!person || !person->isCompeting);
   const auto summary = snapshot ? snapshot : tavro::make<HKActivitySummary>();
