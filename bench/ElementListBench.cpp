@@ -13,7 +13,7 @@ constexpr int kHours = 24;
 constexpr int kBars = 365;
 constexpr double kSecondsPerHour = 3600;
 constexpr double kSecondsPerDay = 86400;
-constexpr CalendarDay kFirstBar{20088};
+constexpr CalendarDay kFirstBar{20089};  // 2025-01-01
 
 double amountOf(int bar) { return 312.25 + bar * 1.37; }
 
