@@ -1,5 +1,8 @@
 #pragma once
 
+#include <benchmark/benchmark.h>
+
+#include <cstdint>
 #include <string_view>
 #include <vector>
 
@@ -22,6 +25,12 @@ struct Figure {
   std::vector<double> microseconds;
 };
 
+/// What one turn of a benchmark works through. Its times are those of one item then.
+inline constexpr char kItems[] = "items";
+inline void setItems(benchmark::State& state, std::size_t items) {
+  state.counters[kItems] = static_cast<double>(items);
+}
+
 /// Loads the bundle in a child process of its own each time and times opening it, installing its
 /// categories, and checking its host contract. To be called before any thread starts.
 std::vector<Figure> loadingFigures();
@@ -30,5 +39,13 @@ std::vector<Figure> loadingFigures();
 void registerMessageBenchmarks();
 void registerStorageBenchmarks();
 void registerSliceBenchmarks();
+void registerElementListBenchmarks();
+void registerHeartRateBenchmarks();
+void registerCalendarBenchmarks();
+void registerWorkoutsBenchmarks();
+
+/// Builds and reads a calendar of that many years once, for a program that counts instructions.
+/// Prints how many days were read. Returns the exit status.
+int countCalendar(std::int64_t years);
 
 }  // namespace tavro::bench

@@ -1,21 +1,14 @@
-#include <benchmark/benchmark.h>
-#include <unicode/dtitvfmt.h>
-#include <unicode/numberformatter.h>
-
-#include <memory>
-
+#include "bench/IcuTexts.h"
 #include "bench/Ratios.h"
 #include "host/screens/day/MoveAndExerciseChart.h"
 #include "platform/accessibility/BundleLoader.h"
-#include "platform/foundation/NSDate.h"
 #include "platform/foundation/NSValue.h"
-#include "platform/foundation/Settings.h"
 
 namespace tavro::bench {
 namespace {
 
 constexpr int kSlices = 8;
-constexpr double kMilliseconds = 1000;
+constexpr double kSecondsPerSlice = 10800;
 
 std::vector<double> hourlyAmounts() {
   std::vector<double> amounts;
@@ -36,32 +29,18 @@ void buildSlices(benchmark::State& state) {
 
 /// Formats the eight slices' spans, and their amounts when asked, with ICU alone.
 void formatSlices(benchmark::State& state, bool withAmounts) {
-  UErrorCode status = U_ZERO_ERROR;
-  const icu::Locale locale("en_US");
-  const auto formatter = [&](const char16_t* skeleton) {
-    std::unique_ptr<icu::DateIntervalFormat> made(
-        icu::DateIntervalFormat::createInstance(skeleton, locale, status));
-    made->setTimeZone(*icu::TimeZone::getGMT());
-    return made;
-  };
-  const auto hours = formatter(u"hxa");
-  const auto minutes = formatter(u"h:mma");
-  const auto numbers = icu::number::NumberFormatter::withLocale(locale).precision(
-      icu::number::Precision::maxFraction(1));
-  const double midnight = currentCalendar()->startOfDayForDate(dateNow())->seconds * kMilliseconds;
+  IcuTexts icu;
+  const auto hours = icu.intervalFormat(u"hxa");
+  const auto minutes = icu.intervalFormat(u"h:mma");
+  const double start = midnight();
   for (auto _ : state) {
     for (int slice = 0; slice < kSlices; ++slice) {
       const bool isLast = slice == kSlices - 1;
-      const double start = midnight + slice * 10800 * kMilliseconds;
-      const icu::DateInterval span(start, start + (isLast ? 10799 : 10800) * kMilliseconds);
-      icu::UnicodeString text;
-      icu::FieldPosition position;
-      (isLast ? minutes : hours)->format(&span, text, position, status);
-      benchmark::DoNotOptimize(text);
+      const double from = start + slice * kSecondsPerSlice;
+      icu.formatInterval(isLast ? minutes : hours, from,
+                         from + (isLast ? kSecondsPerSlice - 1 : kSecondsPerSlice));
       if (withAmounts) {
-        icu::UnicodeString amount =
-            numbers.formatDouble(slice * 65.7 + 21.9, status).toString(status);
-        benchmark::DoNotOptimize(amount);
+        icu.formatNumber(slice * 65.7 + 21.9);
       }
     }
   }

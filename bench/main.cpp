@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cstdio>
+#include <cstdlib>
 #include <map>
 #include <string>
 
@@ -11,6 +12,7 @@
 #include "platform/accessibility/BundleLoader.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/Settings.h"
+#include "reader/SummaryDescription.h"
 
 namespace tavro::bench {
 namespace {
@@ -28,16 +30,27 @@ constexpr Ratio kRatios[] = {
     {"retained value, write, to a virtual call", "retained:write", "virtual", 10},
     {"eight slices, to ICU formatting their labels", "slices", "icu:labels", 1.3},
     {"eight slices, to ICU formatting all their texts", "slices", "icu:texts", 1.25},
+    {"24 stand hours, to ICU formatting their texts", "hours", "icu:hours", 0},
+    {"365 trend bars, to ICU formatting their texts", "bars", "icu:bars", 1.4},
+    {"heart-rate slice of 10,000, to one pass; a reading", "slice:10000", "pass:10000", 0},
+    {"heart-rate slice of 200,000, to one pass; a reading", "slice:200000", "pass:200000", 1.2},
+    {"a reading of 200,000, to one of 10,000", "slice:200000", "slice:10000", 0},
+    {"a calendar day of 10 years, to one of 1 year", "calendar:10", "calendar:1", 0},
+    {"a workout row of 100,000, to one of 100", "workouts:100000", "workouts:100", 0},
 };
 
-/// Keeps the nanoseconds of every repetition.
+/// Keeps the nanoseconds of every repetition, divided by the items of a turn where it has any.
 class Collector : public benchmark::BenchmarkReporter {
  public:
   bool ReportContext(const Context& /*context*/) override { return true; }
   void ReportRuns(const std::vector<Run>& runs) override {
     for (const Run& run : runs) {
-      if (run.run_type == Run::RT_Iteration) {
-        times[run.run_name.function_name].push_back(run.GetAdjustedCPUTime());
+      if (run.error_occurred) {
+        std::fprintf(stderr, "%s: %s\n", run.benchmark_name().c_str(), run.error_message.c_str());
+      } else if (run.run_type == Run::RT_Iteration) {
+        const auto items = run.counters.find(kItems);
+        times[run.run_name.function_name].push_back(
+            run.GetAdjustedCPUTime() / (items == run.counters.end() ? 1 : items->second.value));
       }
     }
   }
@@ -93,8 +106,14 @@ void printFigures(const std::vector<Figure>& figures) {
 int main(int argumentCount, char** arguments) {
   using namespace tavro;
   Settings::current().now = secondsFromIso("2026-03-11T15:20Z").value();
+  const std::string bundlePath = std::string(TAVRO_BUILD) + "/AXTavro.axbundle";
+  if (argumentCount == 4 && std::string_view(arguments[1]) == "--count" &&
+      std::string_view(arguments[2]) == "calendar") {
+    letSummariesDescribeRings(loadAccessibilityBundle(bundlePath));
+    return bench::countCalendar(std::atoi(arguments[3]));
+  }
   const std::vector<bench::Figure> figures = bench::loadingFigures();
-  static_cast<void>(loadAccessibilityBundle(std::string(TAVRO_BUILD) + "/AXTavro.axbundle"));
+  letSummariesDescribeRings(loadAccessibilityBundle(bundlePath));
 
   std::vector<std::string> texts(arguments, arguments + argumentCount);
   texts.insert(texts.begin() + 1, {"--benchmark_repetitions=9", "--benchmark_min_time=0.02",
@@ -107,6 +126,10 @@ int main(int argumentCount, char** arguments) {
   bench::registerMessageBenchmarks();
   bench::registerStorageBenchmarks();
   bench::registerSliceBenchmarks();
+  bench::registerElementListBenchmarks();
+  bench::registerHeartRateBenchmarks();
+  bench::registerCalendarBenchmarks();
+  bench::registerWorkoutsBenchmarks();
   bench::Collector collector;
   benchmark::RunSpecifiedBenchmarks(&collector);
   bench::printRatios(collector);
