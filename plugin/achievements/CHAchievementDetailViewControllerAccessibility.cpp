@@ -19,7 +19,7 @@ class CHAchievementDetailViewControllerAccessibility : public SafeCategory {
     const Ref<NSString> text = safeStringForKey(label, "text");
     if (lengthOfText(text) > 0) {
       trySend<void>(label, "setAccessibilityLabel:",
-                 AXLabelForElements(componentsSeparatedByNewlines(*text)));
+                    AXLabelForElements(componentsSeparatedByNewlines(*text)));
     }
   }
 
@@ -44,7 +44,7 @@ class CHAchievementDetailViewControllerAccessibility : public SafeCategory {
     const Ref<UIView> badge = safeUIViewForKey(self, "badgeContainer");
     trySend<void>(badge, "setIsAccessibilityElement:", true);
     trySend<void>(badge, "setAccessibilityLabel:",
-               stringWithFormat(localized("achievement.badge.format"), {id(title)}));
+                  stringWithFormat(localized("achievement.badge.format"), {id(title)}));
     // The badge is drawn by other means, and its container may count as hidden meanwhile.
     trySend<void>(badge, "_accessibilitySetViewIsVisible:", true);
     trySend<void>(badge, "_accessibilitySetOverridesInvisibility:", true);

@@ -39,8 +39,8 @@ class CHFriendListTableViewCellAccessibility : public SafeCategory {
     trySend<void>(badge, "setIsAccessibilityElement:", true);
     trySend<void>(badge, "setAccessibilityLabel:", localized("competition.in.progress"));
     trySend<void>(name, "_setAccessibilityLabelBlock:", LabelBlock([name = Weak<>(name.get())] {
-                 return nameWithoutBullets(name.strong());
-               }));
+                    return nameWithoutBullets(name.strong());
+                  }));
     const Ref<NSArray> parts =
         axArrayByIgnoringNilElements({name, safeValueForKey(self, "detailLineOneLabel"),
                                       safeValueForKey(self, "detailLineTwoLabel"), badge});

@@ -22,11 +22,12 @@ class CHFriendListViewControllerAccessibility : public SafeCategory {
     const auto button = typedRead<UIBarButtonItem>(self, "_sortBarButtonItem");
     // Blocks rather than texts: the host changes the title whenever the order changes.
     trySend<void>(button, "_setAccessibilityLabelBlock:", LabelBlock([] {
-                 return localized("sort.by.options");
-               }));
-    trySend<void>(button, "_setAccessibilityValueBlock:", LabelBlock([button = Weak<>(button.get())] {
-                 return safeStringForKey(button.strong(), "title");
-               }));
+                    return localized("sort.by.options");
+                  }));
+    trySend<void>(button,
+                  "_setAccessibilityValueBlock:", LabelBlock([button = Weak<>(button.get())] {
+                    return safeStringForKey(button.strong(), "title");
+                  }));
   }
 };
 

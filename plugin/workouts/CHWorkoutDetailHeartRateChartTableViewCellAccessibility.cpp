@@ -40,13 +40,14 @@ class CHWorkoutDetailHeartRateChartTableViewCellAccessibility : public SafeCateg
     super.send<void>();
     const Ref<UIView> overlay = safeUIViewForKey(self, "_noDataOverlayView");
     trySend<void>(overlay,
-               "_setIsAccessibilityElementBlock:", FlagBlock([held = Weak<UIView>(overlay)] {
-                 const Ref<UIView> shown = held.strong();
-                 return shown && !shown->isHidden();
-               }));
-    trySend<void>(overlay, "_setAccessibilityLabelBlock:", LabelBlock([held = Weak<UIView>(overlay)] {
-                 return labelOfOverlay(held.strong());
-               }));
+                  "_setIsAccessibilityElementBlock:", FlagBlock([held = Weak<UIView>(overlay)] {
+                    const Ref<UIView> shown = held.strong();
+                    return shown && !shown->isHidden();
+                  }));
+    trySend<void>(overlay,
+                  "_setAccessibilityLabelBlock:", LabelBlock([held = Weak<UIView>(overlay)] {
+                    return labelOfOverlay(held.strong());
+                  }));
     trySend<void>(
         overlay, "_setAccessibilityActivateBlock:", FlagBlock([held = Weak<UIView>(overlay)] {
           return trySend<bool>(firstSubview<UIButton>(held.strong()), "accessibilityActivate");

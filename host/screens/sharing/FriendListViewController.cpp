@@ -1,12 +1,11 @@
 #include "host/screens/sharing/FriendListViewController.h"
 
-#include "host/screens/sharing/FriendInboxViewController.h"
-
 #include <algorithm>
 
 #include "host/Application.h"
 #include "host/screens/day/DayViewController.h"
 #include "host/screens/sharing/FriendInboxBarButtonView.h"
+#include "host/screens/sharing/FriendInboxViewController.h"
 
 namespace tavro {
 namespace {
