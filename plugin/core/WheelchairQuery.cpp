@@ -39,10 +39,12 @@ bool _userIsWheelchairUserWithNarrelOn() {
     query();
     queriedNow = true;
   });
+  // Read before the refresh starts: however soon it ends, it is the next call's answer.
+  const bool answer = usesWheelchair;
   if (!queriedNow) {
     GlobalQueue::shared().async(&query);
   }
-  return usesWheelchair;
+  return answer;
 }
 
 }  // namespace tavro
