@@ -1,12 +1,9 @@
+#include "platform/accessibility/Collections.h"
 #include "platform/accessibility/KeyAccess.h"
 #include "platform/accessibility/SafeCategory.h"
 
 namespace tavro {
 namespace {
-
-/// In reading order.
-constexpr Name kContainers[] = {"_numberOfWorkoutsLabel", "_durationLabel", "_activeEnergyLabel",
-                                "_distanceLabel", "_paceLabel"};
 
 /// The summary of the workouts list hands out those of its figures that are shown.
 class CHListSummaryTableViewCellAccessibility : public SafeCategory {
@@ -15,14 +12,13 @@ class CHListSummaryTableViewCellAccessibility : public SafeCategory {
   static constexpr Name target = "CHListSummaryTableViewCell";
 
   id accessibilityElements() {
-    std::vector<id> visible;
-    for (const Name key : kContainers) {
-      const Ref<UIView> container = safeUIViewForKey(self, key);
-      if (trySend<bool>(container, "_accessibilityViewIsVisible")) {
-        visible.emplace_back(container);
-      }
-    }
-    return arrayWithObjects(std::move(visible));
+    const Ref<NSArray> figures = axArrayByIgnoringNilElements(
+        {safeUIViewForKey(self, "_numberOfWorkoutsLabel"), safeUIViewForKey(self, "_durationLabel"),
+         safeUIViewForKey(self, "_activeEnergyLabel"), safeUIViewForKey(self, "_distanceLabel"),
+         safeUIViewForKey(self, "_paceLabel")});
+    return ax_filteredArrayUsingBlock(figures, [](const id& figure) {
+      return trySend<bool>(figure, "_accessibilityViewIsVisible");
+    });
   }
 };
 
