@@ -54,6 +54,11 @@ const icu::SimpleDateFormat& patternFormat(std::string_view pattern) {
 
 const icu::SimpleDateFormat& templateFormat(std::string_view skeleton) {
   return icuCache<TemplateKind, icu::SimpleDateFormat>().get(userKey(skeleton), [&] {
+    // A month alone is named as one: some languages' pattern for it has the form it has in dates,
+    // a genitive in Greek.
+    if (skeleton.find_first_not_of('M') == std::string_view::npos) {
+      return makePatternFormat(unicode(std::string(skeleton.size(), 'L')));
+    }
     UErrorCode status = U_ZERO_ERROR;
     const icu::UnicodeString pattern = patternGenerator().getBestPattern(unicode(skeleton), status);
     requireSuccess(status, "choosing a date pattern");

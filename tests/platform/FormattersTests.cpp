@@ -116,16 +116,12 @@ TEST_F(FormattersTest, LettersAloneAreATemplateAndAnythingElseAPattern) {
     std::string_view format;
     std::string_view expected;
   } cases[] = {
-      {"en_US", "dMMMM", "June 5"},
-      {"de_DE", "dMMMM", "5. Juni"},
-      {"ja_JP", "dMMMM", "6月5日"},
-      {"ar_EG", "dMMMM", "٥ يونيو"},
-      {"pl_PL", "dMMMM", "5 czerwca"},
+      {"en_US", "dMMMM", "June 5"},  {"de_DE", "dMMMM", "5. Juni"},
+      {"ja_JP", "dMMMM", "6月5日"},  {"el_GR", "MMMM", "Ιούνιος"},
+      {"ar_EG", "dMMMM", "٥ يونيو"}, {"pl_PL", "dMMMM", "5 czerwca"},
       {"pl_PL", "MMMM", "czerwiec"},  // standing alone, not "of June"
-      {"en_US", "EEEE", "Friday"},
-      {"de_DE", "EEEE, MMM d, yyyy", "Freitag, Juni 5, 2026"},
-      {"de_DE", "d.M.", "5.6."},
-      {"en_US", "yyyy-MM-dd'T'HH:mm", "2026-06-05T14:07"},
+      {"en_US", "EEEE", "Friday"},   {"de_DE", "EEEE, MMM d, yyyy", "Freitag, Juni 5, 2026"},
+      {"de_DE", "d.M.", "5.6."},     {"en_US", "yyyy-MM-dd'T'HH:mm", "2026-06-05T14:07"},
       {"en_US", "", "(nil)"},
   };
   for (const auto& each : cases) {
