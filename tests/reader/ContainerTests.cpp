@@ -62,7 +62,7 @@ TEST_F(ContainerTest, WhereaboutsUseTheUsersDigits) {
   Settings::current().locale = "ar_EG";
   const auto elements = accessibleElements(window);
   const ContainerSpeech speech(Verbosity::elements, elements);
-  EXPECT_EQ(speech.whereabouts(2), "٢ من ٣\u200f, Steps, مخطط, صف");
+  EXPECT_EQ(speech.whereabouts(2), "٢ من ٣\u200f, Steps, رسم بياني, صف");
   EXPECT_EQ(speech.whereabouts(5), "");
 }
 

@@ -27,6 +27,9 @@ constexpr Golden kGoldens[] = {
     {"tour.hi_IN", "hi_IN", true}, {"tour.zh_Hans_CN", "zh_Hans_CN", true},
 };
 
+// How a case is called in lists of tests.
+void PrintTo(const Golden& golden, std::ostream* stream) { *stream << golden.file; }
+
 std::string pathOf(const Golden& golden) {
   return std::string(TAVRO_SOURCE) + "/tests/golden/" + golden.file + ".txt";
 }
