@@ -66,13 +66,13 @@ Ref<View> listing(const Ref<View>& view, std::vector<id> elements) {
   return view;
 }
 
+constexpr Name kRaisingNames[] = {"RaisingAtElement", "RaisingAtElements", "RaisingAtFrame",
+                                  "RaisingAtVisible", "RaisingAtHidden",   "RaisingAtModal"};
 /// Raises at one question.
 template <int Question>
 class Raising : public UILabel {
  public:
-  static constexpr Name classNames[] = {"RaisingAtElement", "RaisingAtElements", "RaisingAtFrame",
-                                        "RaisingAtVisible", "RaisingAtHidden",   "RaisingAtModal"};
-  static constexpr Name className = classNames[Question];
+  static constexpr Name className = kRaisingNames[Question];
   bool flag() { throw Question; }
   id object() { throw Question; }
   CGRect rect() { throw Question; }
