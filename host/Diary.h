@@ -19,6 +19,7 @@ namespace tavro {
 struct CalendarDay {
   /// Days since 1970-01-01, which is also the day's index in the activity summary cache.
   std::int64_t number = 0;
+  // NOLINTNEXTLINE(modernize-use-nullptr): the check takes the 0 of the comparison for a pointer
   friend auto operator<=>(const CalendarDay&, const CalendarDay&) = default;
 };
 

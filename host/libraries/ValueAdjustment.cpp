@@ -18,6 +18,9 @@ void TVUIValueAdjustmentButtonController::setButtons(const Ref<UIButton>& minus,
   minus_ = minus;
   plus_ = plus;
   for (const Ref<UIButton>& button : {minus, plus}) {
+    if (!button) {
+      continue;
+    }
     button->setAction([controller = Weak<>(this), tapped = Weak<>(button.get())] {
       send<void>(controller.strong(), "_performPlusMinusActionWithButton:", tapped.strong());
     });
