@@ -7,13 +7,12 @@
 #include <sstream>
 #include <stdexcept>
 
+#include "platform/foundation/TextFile.h"
 #include "reader/Cursor.h"
 #include "reader/Output.h"
 
 namespace tavro {
 namespace {
-
-std::string quoted(std::string_view text) { return "\"" + std::string(text) + "\""; }
 
 [[noreturn]] void refuse(const std::string& sentence) { throw std::invalid_argument(sentence); }
 
@@ -36,7 +35,7 @@ Value choiceFrom(const std::string& text, const std::map<std::string, Value>& ch
   for (const auto& [word, value] : choices) {
     known += (known.empty() ? "" : ", ") + word;
   }
-  refuse(quoted(text) + " is not " + what + "; there are: " + known);
+  refuse(inQuotes(text) + " is not " + what + "; there are: " + known);
 }
 
 /// A shown screen, and the cursor on the element that the command names.
@@ -48,7 +47,8 @@ struct Place {
 
   void find(const Command& command) {
     if (command.label.empty() || !cursor->find(command.label)) {
-      refuse("no element of " + quoted(command.screen) + " begins with " + quoted(command.label));
+      refuse("no element of " + inQuotes(command.screen) + " begins with " +
+             inQuotes(command.label));
     }
   }
   [[nodiscard]] HeardElement here() const {
@@ -87,7 +87,7 @@ int touchScreen(const Command& command) {
   if (!place.cursor->touch(command.point)) {
     std::ostringstream sentence;
     sentence << "nothing can be heard at " << command.point.x << "," << command.point.y << " on "
-             << quoted(command.screen);
+             << inQuotes(command.screen);
     refuse(sentence.str());
   }
   std::cout << place.here().utterance << "\n";
@@ -99,7 +99,7 @@ int activateElement(const Command& command) {
   place.find(command);
   const std::string before = place.here().utterance;
   if (!place.cursor->activate()) {
-    refuse(quoted(before) + " does nothing when it is activated");
+    refuse(inQuotes(before) + " does nothing when it is activated");
   }
   std::cout << place.here().utterance << "\n";
   return kSucceeded;
@@ -115,7 +115,7 @@ int adjustElement(const Command& command) {
   for (int time = 0; time < command.times; ++time) {
     const std::string before = place.here().utterance;
     if (!(command.up ? place.cursor->increment() : place.cursor->decrement())) {
-      refuse(quoted(before) + " cannot be adjusted");
+      refuse(inQuotes(before) + " cannot be adjusted");
     }
     text += utteranceAfterAdjusting(place.here()) + "\n";
   }
@@ -137,7 +137,7 @@ CGPoint pointFromText(const std::string& text) {
                      ? std::nullopt
                      : numberFrom<double>(std::string_view(text).substr(comma + 1));
   if (!x || !y || !std::isfinite(*x) || !std::isfinite(*y)) {
-    refuse(quoted(text) + " is not a point such as 120,300");
+    refuse(inQuotes(text) + " is not a point such as 120,300");
   }
   return {*x, *y};
 }
@@ -146,7 +146,7 @@ int timesFromText(const std::string& text) {
   constexpr int most = 1000;
   const auto times = numberFrom<int>(text);
   if (!times || *times < 1 || *times > most) {
-    refuse(quoted(text) + " is not a number of times from 1 to " + std::to_string(most));
+    refuse(inQuotes(text) + " is not a number of times from 1 to " + std::to_string(most));
   }
   return *times;
 }

@@ -218,7 +218,8 @@ std::string reportJson(const ValidationReport& report) {
 bool isClean(const ValidationReport& report) {
   return std::ranges::all_of(report.checks, &CheckOutcome::passed) &&
          std::ranges::all_of(report.installations, [](const InstallationOutcome& category) {
-           return std::ranges::all_of(category.methods, &GraftOutcome::intercepts);
+           return category.installed &&
+                  std::ranges::all_of(category.methods, &GraftOutcome::intercepts);
          });
 }
 

@@ -26,7 +26,7 @@ std::string treeJson(std::string_view screen, const std::vector<HeardElement>& e
 /// there are.
 std::string reportTable(const ValidationReport& report);
 std::string reportJson(const ValidationReport& report);
-/// Whether every check passed and every method of every installed category intercepts.
+/// Whether every check passed, every category is installed and every one of its methods intercepts.
 bool isClean(const ValidationReport& report);
 
 }  // namespace tavro

@@ -8,6 +8,7 @@
 #include "platform/foundation/Language.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/Settings.h"
+#include "platform/foundation/TextFile.h"
 #include "platform/runtime/Dispatch.h"
 #include "reader/SummaryDescription.h"
 
@@ -15,7 +16,7 @@ namespace tavro {
 
 void requireKnownLocale(const std::string& locale) {
   if (!isKnownLocale(locale)) {
-    throw std::invalid_argument("\"" + locale + "\" is not a locale that is known here");
+    throw std::invalid_argument(inQuotes(locale) + " is not a locale that is known here");
   }
 }
 
@@ -26,17 +27,17 @@ void applySettings(const SessionOptions& options, const Diary& diary) {
   requireKnownLocale(options.locale);
   settings.locale = options.locale;
   if (!options.calendar.empty() && !calendarWithIdentifier(options.calendar)) {
-    throw std::invalid_argument("\"" + options.calendar + "\" is not a calendar");
+    throw std::invalid_argument(inQuotes(options.calendar) + " is not a calendar");
   }
   settings.calendar = options.calendar;
   settings.timeZone = options.timeZone.value_or(diary.timeZone);
   if (!isKnownTimeZone(settings.timeZone)) {
-    throw std::invalid_argument("\"" + settings.timeZone + "\" is not a time zone");
+    throw std::invalid_argument(inQuotes(settings.timeZone) + " is not a time zone");
   }
   const std::string now = options.now.value_or(diary.now.iso);
   const std::optional<double> seconds = secondsFromIso(now);
   if (!seconds) {
-    throw std::invalid_argument("\"" + now + "\" is not a moment such as 2026-03-02T08:15");
+    throw std::invalid_argument(inQuotes(now) + " is not a moment such as 2026-03-02T08:15");
   }
   settings.now = *seconds;
   settings.wheelchairUse =

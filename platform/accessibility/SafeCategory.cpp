@@ -30,6 +30,16 @@ GraftOutcome graft(Class* target, const Method& method, Class* category) {
   return outcome;
 }
 
+/// ": ..." for a class whose declaration could not be carried out.
+std::string registrationProblemOf(Name name) {
+  for (const RegistrationProblem& problem : registrationProblems()) {
+    if (problem.className == name.text()) {
+      return ": " + problem.reason;
+    }
+  }
+  return {};
+}
+
 void graftAll(Class* target, Class* methods, Class* category, std::vector<GraftOutcome>& outcomes) {
   for (const Method* method : methods->ownMethods()) {
     if (!methods->isMetaclass() ||
@@ -62,10 +72,15 @@ InstallationOutcome installSafeCategory(Name name) {
   InstallationOutcome outcome{std::string(name.text()), {}, false, {}, {}};
   Class* const category = Class::named(name);
   if (category == nullptr) {
-    outcome.reason = "the category's class is not loaded";
+    outcome.reason = "the category's class is not loaded" + registrationProblemOf(name);
     return outcome;
   }
-  outcome.target = utf8(trySend<id>(category, "safeCategoryTargetClassName"));
+  try {
+    outcome.target = utf8(send<id>(category, "safeCategoryTargetClassName"));
+  } catch (...) {
+    outcome.reason = "asking for its target class raises";
+    return outcome;
+  }
   Class* const target = Class::named(Name::make(outcome.target));
   if (target == nullptr) {
     outcome.reason = "the target class is not loaded";

@@ -1,6 +1,7 @@
 #include "platform/accessibility/Traversal.h"
 
 #include <algorithm>
+#include <unordered_set>
 
 #include "platform/accessibility/Labels.h"
 #include "platform/foundation/Language.h"
@@ -8,10 +9,27 @@
 namespace tavro {
 namespace {
 
-constexpr std::size_t kDeepestNesting = 200;
+/// Where a walk was and how deep it is. An object is visited at its first place only: lists may
+/// hold each other, and lists of lists would multiply.
+class Visits {
+ public:
+  /// Whether the walk goes on into the object; `leave` follows.
+  bool enter(const id& object) {
+    if (depth_ >= kDeepestNesting || !isFirst(object)) {
+      return false;
+    }
+    ++depth_;
+    return true;
+  }
+  void leave() { --depth_; }
+  /// Whether the object was met for the first time.
+  bool isFirst(const id& object) { return seen_.insert(object.get()).second; }
 
-/// The objects on the way down to where a walk is, so that a cycle ends.
-using Path = std::vector<const Object*>;
+ private:
+  static constexpr std::size_t kDeepestNesting = 200;
+  std::size_t depth_ = 0;
+  std::unordered_set<const Object*> seen_;
+};
 
 bool isSilent(const id& object) {
   const bool isView = isA<UIView>(object.get());
@@ -48,15 +66,6 @@ Children childrenOf(const id& object) {
   return children;
 }
 
-/// Enters an object unless the walk is inside it already.
-bool enter(Path& path, const id& object) {
-  if (path.size() >= kDeepestNesting || std::ranges::find(path, object.get()) != path.end()) {
-    return false;
-  }
-  path.push_back(object.get());
-  return true;
-}
-
 class ElementWalk {
  public:
   void visit(const id& object) {
@@ -64,14 +73,16 @@ class ElementWalk {
       return;
     }
     if (trySend<bool>(object, "isAccessibilityElement")) {
-      found.push_back({object, containers_});
+      if (visits_.isFirst(object)) {
+        found.push_back({object, containers_});
+      }
       return;
     }
     visitChildren(object);
   }
 
   void visitChildren(const id& object) {
-    if (!object || !enter(path_, object)) {
+    if (!object || !visits_.enter(object)) {
       return;
     }
     const Children children = childrenOf(object);
@@ -84,13 +95,13 @@ class ElementWalk {
     if (children.isElementList) {
       containers_.pop_back();
     }
-    path_.pop_back();
+    visits_.leave();
   }
 
   std::vector<AccessibleElement> found;
 
  private:
-  Path path_;
+  Visits visits_;
   std::vector<id> containers_;
 };
 
@@ -102,13 +113,13 @@ class TextWalk {
         exclusions_(exclusions) {}
 
   void visitChildren(const id& object) {
-    if (!enter(path_, object)) {
+    if (!visits_.enter(object)) {
       return;
     }
     for (const id& child : childrenOf(object).objects) {
       visit(child);
     }
-    path_.pop_back();
+    visits_.leave();
   }
 
   std::vector<id> texts;
@@ -137,7 +148,7 @@ class TextWalk {
   bool includesHeaders_;
   bool includesFocusable_;
   Ref<NSArray> exclusions_;
-  Path path_;
+  Visits visits_;
 };
 
 /// A merge sort: unlike the library's sorts it asks nothing of the comparison but an answer.

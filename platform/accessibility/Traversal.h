@@ -9,8 +9,8 @@ namespace tavro {
 
 // Reading order. A modal view silences its siblings. What is hidden or invisible is silent with all
 // below it. An element is a leaf. Otherwise an object's `accessibilityElements`, if not nil, are
-// visited in the order given, else its subviews in geometric order. Objects that raise are silent,
-// and an object that contains itself is visited once.
+// visited in the order given, else its subviews in geometric order. Objects that raise are silent.
+// An object is visited once, at its first place, wherever else it is listed.
 
 /// One element, and what it was found in.
 struct AccessibleElement {

@@ -123,14 +123,20 @@ void AXValidationManager::performValidations(const ChecksHandler& checks,
                                              const PreValidationHandler& before,
                                              const PostValidationHandler& after,
                                              const InstallationHandler& installation) {
-  const bool runsChecks = before && before(this);
-  if (runsChecks && checks) {
+  const auto callHandler = [this](Name handler, const std::function<void()>& call) {
     currentCategory_.clear();
-    checks(this);
+    contain(AXValidationManager::className, handler, call);
+  };
+  bool runsChecks = false;
+  if (before) {
+    callHandler("withPreValidationHandler:", [&] { runsChecks = before(this); });
+  }
+  if (runsChecks && checks) {
+    callHandler("performValidations:", [&] { checks(this); });
   }
   const auto installer = tavro::make<AXSafeCategoryInstaller>();
   if (installation) {
-    installation(installer);
+    callHandler("safeCategoryInstallationHandler:", [&] { installation(installer); });
   }
   if (runsChecks) {
     validateCategories(installer->categories);
@@ -139,7 +145,7 @@ void AXValidationManager::performValidations(const ChecksHandler& checks,
     report_.installations.push_back(installSafeCategory(category));
   }
   if (after) {
-    after(this);
+    callHandler("postValidationHandler:", [&] { after(this); });
   }
   reloadAccessibilityInformation();
 }
@@ -147,9 +153,24 @@ void AXValidationManager::performValidations(const ChecksHandler& checks,
 void AXValidationManager::validateCategories(const std::vector<Name>& categories) {
   for (const Name category : categories) {
     currentCategory_ = category.text();
-    trySend<void>(Class::named(category), "_accessibilityPerformValidations:", id(this));
+    Class* const isa = Class::named(category);
+    constexpr Name checks = "_accessibilityPerformValidations:";
+    if (respondsTo(isa, checks)) {
+      contain(category, checks, [&] { send<void>(isa, checks, id(this)); });
+    }
   }
   currentCategory_.clear();
+}
+
+void AXValidationManager::contain(Name className, Name selector,
+                                  const std::function<void()>& part) {
+  try {
+    part();
+  } catch (...) {
+    report_.checks.push_back({currentCategory_, std::string(className.text()),
+                              std::string(selector.text()), HostCheck::Kind::classMethod, "", false,
+                              "it raises"});
+  }
 }
 
 bool AXValidationManager::validate(const HostCheck& check) {

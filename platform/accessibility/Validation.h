@@ -109,7 +109,8 @@ using InstallationHandler = std::function<void(id)>;
 /// process-wide checks; the installation handler, which only names categories; if checks run, each
 /// named category's own; then the categories are installed in the order in which they were named;
 /// then the post-validation handler. No method is grafted before all checks ran, so that they see
-/// the bare host.
+/// the bare host. A handler or a category's checks that raise are reported as a failed check and
+/// stop nothing else.
 class AXValidationManager : public NSObject {
  public:
   static constexpr Name className = "AXValidationManager";
@@ -134,6 +135,8 @@ class AXValidationManager : public NSObject {
 
  private:
   void validateCategories(const std::vector<Name>& categories);
+  /// Calls a part of the plug-in; one that raises is a failed check of that method.
+  void contain(Name className, Name selector, const std::function<void()>& part);
 
   ValidationReport report_;
   std::string processName_;

@@ -8,10 +8,14 @@
 
 namespace tavro {
 
-/// A file that people can mend: "FILE:LINE: REASON", without a line where the file is missing.
+/// A text of unknown origin on one line of valid UTF-8: line breaks and other controls are blanks.
+std::string oneLine(std::string_view text);
+
+/// A file that people can mend: "FILE:LINE: REASON", without a line where the file is missing. One
+/// line, whatever the file holds.
 class FileError : public std::runtime_error {
  public:
-  using std::runtime_error::runtime_error;
+  explicit FileError(std::string_view sentence) : std::runtime_error(oneLine(sentence)) {}
 };
 
 /// The texts of one table in one language, by key. A text may be an `NSPluralFormat`.

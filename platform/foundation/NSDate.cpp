@@ -66,7 +66,8 @@ std::optional<std::array<std::int64_t, 6>> isoNumbers(std::string_view text) {
   std::size_t current = 0;
   for (std::size_t index = 0; index < text.size(); ++index) {
     const bool isDigit = text[index] >= '0' && text[index] <= '9';
-    if (kIsoForm[index] != (isDigit ? 'd' : text[index])) {
+    const bool wantsDigit = kIsoForm[index] == 'd';
+    if (isDigit != wantsDigit || (!isDigit && text[index] != kIsoForm[index])) {
       return std::nullopt;
     }
     if (isDigit) {

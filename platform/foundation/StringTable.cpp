@@ -1,4 +1,5 @@
 #include <unicode/locid.h>
+#include <unicode/uchar.h>
 #include <unicode/utf16.h>
 #include <unicode/utf8.h>
 
@@ -10,6 +11,15 @@
 #include "platform/foundation/TextFile.h"
 
 namespace tavro {
+
+std::string oneLine(std::string_view text) {
+  std::u16string line(string(text)->text());
+  std::ranges::replace_if(
+      line,
+      [](char16_t unit) { return u_isISOControl(unit) != 0 || unit == 0x2028 || unit == 0x2029; },
+      u' ');
+  return string(line)->utf8();
+}
 
 TextFile::TextFile(std::string path) : path_(std::move(path)) {
   std::ifstream stream(path_, std::ios::binary);

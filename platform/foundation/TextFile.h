@@ -9,7 +9,7 @@
 
 namespace tavro {
 
-inline std::string inQuotes(std::string_view text) { return "\"" + std::string(text) + "\""; }
+inline std::string inQuotes(std::string_view text) { return "\"" + oneLine(text) + "\""; }
 
 /// A whole file of valid UTF-8.
 class TextFile {

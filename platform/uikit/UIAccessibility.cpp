@@ -1,5 +1,7 @@
 #include "platform/uikit/UIAccessibility.h"
 
+#include <unordered_map>
+
 #include "platform/accessibility/Labels.h"
 #include "platform/foundation/Settings.h"
 #include "platform/uikit/UIView.h"
@@ -276,7 +278,23 @@ id UIAccessibilityAggregateElement::initWithContainerAndElements(const id& conta
 }
 
 CGRect UIAccessibilityAggregateElement::naturalFrame() {
-  return UIAXFrameForElements(representedElements);
+  // Elements may represent each other, and each other's: while the outermost is asked, each of them
+  // is asked once.
+  thread_local std::unordered_map<const Object*, std::optional<CGRect>> asked;
+  const auto [known, isFirst] = asked.try_emplace(this);
+  if (!isFirst && !known->second) {
+    raise(kInternalInconsistencyException, "an element represents itself");
+  }
+  if (!isFirst) {
+    return *known->second;
+  }
+  const bool isOutermost = asked.size() == 1;
+  const CGRect frame = UIAXFrameForElements(representedElements);
+  asked[this] = frame;
+  if (isOutermost) {
+    asked.clear();
+  }
+  return frame;
 }
 
 void UIAccessibilityPostNotification(UIAccessibilityNotification notification, const id& argument) {

@@ -246,6 +246,44 @@ TEST_F(ValidationTests, TheHandlersRunInOrderAndMayBeMissing) {
   EXPECT_EQ(manager->report().installations.size(), 1U);
 }
 
+TEST_F(ValidationTests, WhatRaisesIsAFailedCheckAndTheRestIsDone) {
+  const auto raising = [](auto&&...) { throw std::runtime_error("a handler"); };
+  manager->performValidations(
+      [&](const id&) { return raising(), true; }, [](const id&) { return true; }, raising,
+      [&](const id& installer) {
+        for (const char* const category : {"RaisingAccessibility", "GaugeTestAccessibility"}) {
+          send<void>(installer, "installSafeCategory:canInteractWithTargetClass:", string(category),
+                     true);
+        }
+        raising();
+      });
+  const ValidationReport& report = manager->report();
+  std::vector<std::string> failed;
+  for (const CheckOutcome& check : report.checks) {
+    if (check.reason == "it raises") {
+      failed.push_back(check.className + " " + check.member);
+    }
+  }
+  EXPECT_EQ(failed,
+            (std::vector<std::string>{"AXValidationManager performValidations:",
+                                      "AXValidationManager safeCategoryInstallationHandler:",
+                                      "RaisingAccessibility _accessibilityPerformValidations:",
+                                      "AXValidationManager postValidationHandler:"}));
+  ASSERT_EQ(report.installations.size(), 2U);
+  EXPECT_TRUE(report.installations[1].installed) << "what was named before is installed";
+  const auto other = make<AXValidationManager>();
+  EXPECT_NO_THROW(other->performValidations({}, [](const id&) -> bool { throw 1; }, {}, {}));
+  EXPECT_EQ(other->report().checks.at(0).member, "withPreValidationHandler:");
+}
+
+TEST_F(ValidationTests, ACategoryThatCannotBeRegisteredSaysWhy) {
+  declareClass({.name = "HomelessAccessibility", .superclass = "NoSuchSuperclass"});
+  const ValidationReport& report = run({"HomelessAccessibility", "GaugeTestAccessibility"});
+  EXPECT_EQ(report.installations.at(0).reason,
+            "the category's class is not loaded: the class \"NoSuchSuperclass\" is not loaded");
+  EXPECT_TRUE(report.installations.at(1).installed);
+}
+
 TEST_F(ValidationTests, GraftsInterceptAndReachTheHostsOwnThroughSuper) {
   const InstallationOutcome outcome = run({"GaugeTestAccessibility"}).installations.at(0);
   EXPECT_EQ(outcome.target, "ValidationTestGauge");
@@ -307,7 +345,7 @@ TEST_F(ValidationTests, WhatCannotBeInstalledIsReportedAndTheNextIsInstalled) {
   } cases[] = {
       {"NoSuchCategory", "", "the category's class is not loaded"},
       {"StrayAccessibility", "NoSuchHostClass", "the target class is not loaded"},
-      {"RaisingAccessibility", "", "the target class is not loaded"},
+      {"RaisingAccessibility", "", "asking for its target class raises"},
       {"", "", "the category's class is not loaded"},
       {"GaugeTestAccessibility", "ValidationTestGauge", ""},
   };

@@ -1,3 +1,4 @@
+#include <atomic>
 #include <thread>
 
 #include "platform/healthkit/HKHealthStore.h"
@@ -137,6 +138,32 @@ TEST_F(WheelchairTest, CallsFromTwoThreadsAtOnceAskOnceEach) {
   EXPECT_EQ(settings.wheelchairQueries, 2 * calls);
   settings.screenReaderRuns = false;
   EXPECT_TRUE(ask());
+}
+
+TEST_F(WheelchairTest, TheScreenReaderGoesOnAndOffWhileThreadsAsk) {
+  // Two threads ask, this one switches, and the queue's own refreshes.
+  settings.wheelchairUse = kYes;
+  EXPECT_TRUE(ask());
+  constexpr int enough = 2000;
+  std::atomic<int> asked = 0;
+  std::atomic<int> wrong = 0;
+  std::vector<std::thread> threads;
+  for (int thread = 0; thread < 2; ++thread) {
+    threads.emplace_back([&] {
+      while (asked++ < enough) {
+        wrong += ask() ? 0 : 1;
+      }
+    });
+  }
+  for (int round = 0; asked < enough; ++round) {
+    settings.screenReaderRuns = round % 2 != 0;
+    settings.wheelchairUseFails = round % 7 == 0;
+  }
+  for (std::thread& thread : threads) {
+    thread.join();
+  }
+  GlobalQueue::shared().drain();
+  EXPECT_EQ(wrong, 0) << "what was learnt once is not unlearnt, on or off, refreshed or failing";
 }
 
 TEST_F(WheelchairTest, SettingsChangeWhileRefreshesRun) {
