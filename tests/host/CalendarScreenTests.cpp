@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <tuple>
+
 #include "host/Dates.h"
 #include "host/screens/calendar/MonthScrollViewController.h"
 #include "platform/foundation/Settings.h"
@@ -62,26 +64,20 @@ TEST(MonthCalendarTest, MonthsAreWholeAndTheUsers) {
 }
 
 TEST(MonthCalendarTest, WeeksBeginWhereTheUsersDo) {
-  struct Case {
-    std::int64_t firstWeekday;
-    const char* locale;
-    std::vector<int> firstRow;  // of March 2026, whose 1st is a Sunday
-    std::size_t rows;
-  };
-  const Case cases[] = {
+  const std::tuple<std::int64_t, const char*, std::vector<int>, std::size_t> cases[] = {
       {2, "en_US", {6}, 6},
       {1, "en_US", {0, 1, 2, 3, 4, 5, 6}, 5},
       {7, "en_US", {1, 2, 3, 4, 5, 6}, 5},
       {1, "he_IL", {6, 5, 4, 3, 2, 1, 0}, 5},
       {2, "ar_EG", {0}, 6},
   };
-  for (const Case& each : cases) {
-    Settings::current().firstWeekday = each.firstWeekday;
-    Settings::current().locale = each.locale;
+  for (const auto& [firstWeekday, locale, firstRow, expected] : cases) {
+    Settings::current().firstWeekday = firstWeekday;
+    Settings::current().locale = locale;
     const auto months = monthsOf({kToday, kToday, kToday, {}}, 800);
     const auto rows = columnsOf(*months->months().front());
-    EXPECT_EQ(rows.front(), each.firstRow) << each.locale << " " << each.firstWeekday;
-    EXPECT_EQ(rows.size(), each.rows) << each.locale << " " << each.firstWeekday;
+    EXPECT_EQ(rows.front(), firstRow) << locale << " " << firstWeekday;
+    EXPECT_EQ(rows.size(), expected) << locale << " " << firstWeekday;
   }
 }
 

@@ -239,10 +239,7 @@ TEST_F(KeyAccessTests, KeyPathsFollowTheirKeys) {
   const auto label = makeLabel("deep");
   outer->addSubview(inner);
   inner->addSubview(label);
-  const struct {
-    const char* path;
-    const char* found;
-  } cases[] = {
+  const std::pair<const char*, const char*> cases[] = {
       {"text", "deep"},
       {"superview.subviews.firstObject.text", "deep"},
       {"superview.superview", "UIView"},
@@ -251,11 +248,10 @@ TEST_F(KeyAccessTests, KeyPathsFollowTheirKeys) {
       {"hidden", "0"},
       {"superview..text", "(nil)"},
       {".text", "(nil)"},
-      {"noSuchKey.text", "(nil)"},
-  };
-  for (const auto& each : cases) {
-    const id found = safeValueForKeyPath(label.get(), each.path);
-    EXPECT_EQ(found ? utf8(send<id>(found, "description")) : "(nil)", each.found) << each.path;
+      {"noSuchKey.text", "(nil)"}};
+  for (const auto& [path, expected] : cases) {
+    const id found = safeValueForKeyPath(label.get(), path);
+    EXPECT_EQ(found ? utf8(send<id>(found, "description")) : "(nil)", expected) << path;
   }
   EXPECT_FALSE(safeValueForKeyPath(nullptr, "text"));
 }

@@ -18,8 +18,6 @@
 namespace tavro {
 namespace {
 
-using ::tavro::testing::TemporaryFolder;
-
 constexpr const char* kOpen = "⟦";
 constexpr const char* kClose = "⟧";
 
