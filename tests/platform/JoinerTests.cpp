@@ -127,25 +127,14 @@ TEST(JoinerTests, ElementsSpeakTheirLabelsAndInvisibleViewsNothing) {
   EXPECT_EQ(markedParts(joined), "[75]");
 }
 
-/// Has its labels under keys.
-class Card : public UIView {
- public:
-  static constexpr Name className = "JoinerTestCard";
-  Ref<UILabel> title = makeLabel("Title");
-  Ref<UILabel> detail = makeLabel("Detail");
-  Ref<NSString> text = string("text");
-  std::int64_t count = 3;
-  Ref<UILabel> none;
-};
-const Registered cardClass = defineClass<Card, UIView>()
-                                 .variable<&Card::title>("_title")
-                                 .variable<&Card::detail>("_detail")
-                                 .variable<&Card::text>("_text")
-                                 .variable<&Card::count>("_count")
-                                 .variable<&Card::none>("_none");
-
 TEST(JoinerTests, LabelKeysSpeakWhatIsUnderThem) {
-  const auto card = makeView<Card>();
+  const auto card = makeView<UIView>();
+  const auto title = makeLabel("Title");
+  answers(card, "_title", title);
+  answers(card, "_detail", makeLabel("Detail"));
+  answers(card, "_text", string("text"));
+  answers(card, "_none", nullptr);
+  answers<std::int64_t>(card, "_count", [] { return 3; });
   const std::pair<const char*, const char*> cases[] = {
       {"_title, _detail", "Title, Detail"},
       {"detail, title", "Detail, Title"},
@@ -164,7 +153,7 @@ TEST(JoinerTests, LabelKeysSpeakWhatIsUnderThem) {
   for (const auto& [keys, expected] : cases) {
     EXPECT_EQ(labels(keys), expected) << keys;
   }
-  card->title->setHidden(true);
+  title->setHidden(true);
   EXPECT_EQ(labels("_title, _detail"), "Detail");
 }
 

@@ -56,14 +56,11 @@ TEST(CheckTests, EveryKindOfCheckPassesAndFailsWithItsReason) {
       {classExists("NoSuchClass"), "not loaded"},
       {kindOfClass(kRound, kGauge), ""},
       {kindOfClass(kGauge, kGauge), ""},
-      {kindOfClass(kRound, "UIView"), ""},
       {kindOfClass(kGauge, kRound), "not a kind"},
       {kindOfClass(kGauge, "NoSuchClass"), "not a kind"},
       {kindOfClass("NoSuchClass", kGauge), "not loaded"},
-      {conformsToProtocol(kGauge, "ValidationTestMeasuring"), ""},
       {conformsToProtocol(kRound, "ValidationTestMeasuring"), ""},
       {conformsToProtocol(kGauge, "Singing"), "does not adopt"},
-      {instanceVariable(kGauge, "_label", "UILabel"), ""},
       {instanceVariable(kRound, "_label", "UILabel"), ""},
       {instanceVariable(kGauge, "_flag", "B"), ""},
       {instanceVariable(kGauge, "_anything", "@"), ""},
@@ -76,11 +73,9 @@ TEST(CheckTests, EveryKindOfCheckPassesAndFailsWithItsReason) {
       {instanceMethod(kGauge, "configureWithTitle: index:", "v", "@", "q"), ""},
       {instanceMethod(kGauge, "a: b: c: d: e: f: g:", "v", "@", "@", "@", "B", "d", "q", "@"), ""},
       {instanceMethod(kGauge, "text", "v"), "its signature is @"},
-      {instanceMethod(kGauge, "text", "@", "@"), "its signature is @"},
       {instanceMethod(kGauge, "configureWithTitle:index:", "v", "@"), "v,@,q"},
       {instanceMethod(kGauge, "configureWithTitle:index:", "v", "q", "@"), "v,@,q"},
       {instanceMethod(kGauge, "sharedGauge", "@"), "no such method"},
-      {classMethod(kGauge, "sharedGauge", "@"), ""},
       {classMethod(kRound, "sharedGauge", "@"), ""},
       {classMethod(kGauge, "text", "@"), "no such method"},
       {classMethod(kGauge, "sharedGauge", "@", "@"), "its signature is @"},
@@ -241,6 +236,9 @@ TEST_F(ValidationTests, GraftsInterceptAndReachTheHostsOwnThroughSuper) {
   EXPECT_FALSE(respondsTo(classOf<Gauge>(), "_accessibilityPerformValidations:"));
   EXPECT_TRUE(holds(raisedBy([&] { send<id>(round, "lonely"); }), "unrecognized selector"));
   Class* const category = Class::named("GaugeTestAccessibility");
+  Class* const middle = category->superclass();
+  EXPECT_EQ(middle->name(), Name("__GaugeTestAccessibility_super"));
+  EXPECT_EQ(send<Class*>(category, "safeCategoryBaseClass"), middle->superclass());
   EXPECT_EQ(interceptingCategory(classOf<Gauge>(), "text"), category);
   EXPECT_EQ(interceptingCategory(classOf<Gauge>(), "ratio"), nullptr);
   EXPECT_EQ(interceptingCategory(nullptr, "text"), nullptr);
