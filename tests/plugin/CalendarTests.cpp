@@ -199,6 +199,16 @@ TEST_F(CalendarTest, OnceItHasLoadedTheMonthIsHeard) {
   EXPECT_EQ(heard(window).size(), 34U) << "title, button, month and 31 days";
 }
 
+TEST_F(CalendarTest, MonthsAreHeardWhereTheyAreScrolledTo) {
+  const auto controller = makeController<MonthViewController>();
+  controller->setSpan(span({daysFromCivil(2025, 3, 20)}, kToday));
+  EXPECT_EQ(heardOn(controller).size(), 63U) << "title, button, February and March";
+  controller->months().months().scrollTo(0);
+  EXPECT_EQ(heard(window)[3], "March 1, No data") << "months are whole";
+  controller->scrollToToday(nullptr);
+  EXPECT_EQ(heard(window)[2], "February, heading");
+}
+
 TEST_F(CalendarTest, AWholeYearIsReadWithOneLookupADay) {
   const auto months = makeView<MonthScrollView>();
   months->setSpan(span({daysFromCivil(2025, 3, 1)}, kToday));

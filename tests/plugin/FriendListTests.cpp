@@ -4,14 +4,6 @@
 namespace tavro {
 namespace {
 
-std::vector<id> hostArguments;
-bool hostWasAnimated = false;
-void recordFill(Object* /*row*/, const id& person, const id& snapshot, const id& manager,
-                bool animated) {
-  hostArguments = {person, snapshot, manager};
-  hostWasAnimated = animated;
-}
-
 class FriendListTest : public PluginTest {
  protected:
   void SetUp() override {
@@ -137,15 +129,16 @@ TEST_F(FriendListTest, ARowsLabelChangesWithItsFriendAlone) {
 
 TEST_F(FriendListTest, TheHostGetsAllFourArguments) {
   const Name selector = "setFriend:snapshot:formattingManager:animated:";
-  const Method* const grafted = classOf<CHFriendListTableViewCell>()->method(selector);
-  ASSERT_NE(grafted->replaced, nullptr);
-  const_cast<Method*>(grafted->replaced)->implementation =
-      methodOf<&recordFill>(selector).implementation;
-  const std::vector<id> arguments{string("friend"), string("snapshot"), string("manager")};
-  send<void>(makeView<CHFriendListTableViewCell>(), selector, arguments[0], arguments[1],
-             arguments[2], true);
-  EXPECT_EQ(hostArguments, arguments);
-  EXPECT_TRUE(hostWasAnimated);
+  const auto row = rowWith("Ines", "", "");
+  std::vector<id> seen;
+  hostAnswers<void, const id&, const id&, const id&, bool>(
+      row, selector, [&](const id& person, const id& snapshot, const id& manager, bool animated) {
+        seen = {person, snapshot, manager};
+        EXPECT_TRUE(animated);
+      });
+  const std::vector<id> sent{string("friend"), string("snapshot"), string("manager")};
+  send<void>(row, selector, sent[0], sent[1], sent[2], true);
+  EXPECT_EQ(seen, sent);
 }
 
 TEST_F(FriendListTest, AbsentPartsAreLeftOutAndTheRestIsRead) {

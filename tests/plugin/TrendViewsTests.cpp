@@ -1,3 +1,4 @@
+#include "host/screens/trends/TrendCharts.h"
 #include "host/screens/trends/TrendControllers.h"
 #include "tests/support/Plugin.h"
 
@@ -141,6 +142,19 @@ TEST_F(TrendViewsTest, WhatWasNotRecordedIsLeftOutOrNothing) {
   const auto withoutWeekdays = makeController<TrendDetailViewController>();
   withoutWeekdays->setTrend(&trend);
   EXPECT_EQ(heard(withoutWeekdays->view()).back(), "It Over the Year, heading");
+}
+
+TEST_F(TrendViewsTest, EveryTypeOfTrendIsSaidInItsUnit) {
+  const char* const units[] = {"kcal",  "min",       "count", "m",    "count",
+                               "count", "mL/kg·min", "km/hr", "km/hr"};
+  for (std::size_t type = 0; type < std::size(units); ++type) {
+    Trend trend = trendOf(static_cast<std::int64_t>(type), "It", TrendDirection::up);
+    trend.bars = {{{0}, {0}, 1.5}};
+    const auto chart = makeView<TrendDetailChartView>({0, 0, 300, 200});
+    chart->setTrend(trend);
+    show(chart);
+    EXPECT_EQ(heard(chart).back(), std::string("January 1, 1970, 1.5 ") + units[type]);
+  }
 }
 
 }  // namespace

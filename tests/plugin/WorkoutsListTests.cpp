@@ -10,16 +10,6 @@
 namespace tavro {
 namespace {
 
-/// What the host's own formatting yields in `TheHookYieldsWhatTheHostYielded`.
-id& formattedByHost() {
-  static id formatted;
-  return formatted;
-}
-id formatOddly(Object* /*self*/, const id& /*workout*/, const id& /*activity*/,
-               const id& /*context*/) {
-  return formattedByHost();
-}
-
 class WorkoutsListTest : public PluginTest {
  protected:
   static Workout run(const char* start, double distance = 5000) {
@@ -170,10 +160,7 @@ TEST_F(WorkoutsListTest, ASectionIsOneHeadingAndKeepsItsTraits) {
 
 TEST_F(WorkoutsListTest, TheHookYieldsWhatTheHostYielded) {
   constexpr Name selector = "formattedDurationForWorkout:workoutActivity:context:";
-  const Method* const grafted = classOf<CHWorkoutFormattingManager>()->method(selector);
-  ASSERT_NE(grafted->replaced, nullptr);
-  const_cast<Method*>(grafted->replaced)->implementation =
-      methodOf<&formatOddly>(selector).implementation;
+  const auto manager = make<CHWorkoutFormattingManager>();
   const std::pair<id, const char*> cases[] = {
       {attributedString(string("1:02:03")), "1 hour, 2 minutes, 3 seconds"},
       {axAttributedString(string("0:07")), "7 seconds"},
@@ -182,16 +169,15 @@ TEST_F(WorkoutsListTest, TheHookYieldsWhatTheHostYielded) {
       {nullptr, ""},
   };
   for (const auto& [formatted, label] : cases) {
-    formattedByHost() = formatted;
-    const id yielded =
-        send<id>(make<CHWorkoutFormattingManager>(), selector, nullptr, nullptr, nullptr);
+    hostAnswers<id, const id&, const id&, const id&>(
+        manager, selector, [shown = formatted](const id&, const id&, const id&) { return shown; });
+    const id yielded = send<id>(manager, selector, nullptr, nullptr, nullptr);
     EXPECT_EQ(yielded, formatted);
     EXPECT_EQ(spokenText(send<id>(yielded, "accessibilityUserDefinedLabel")), label);
     if (const auto text = as<NSAttributedString>(yielded)) {
       EXPECT_TRUE(text->runs().empty()) << "what is shown carries no speech";
     }
   }
-  formattedByHost() = nullptr;
 }
 
 TEST_F(WorkoutsListTest, AScreenWithoutWorkoutsSaysSo) {

@@ -3,6 +3,7 @@
 #include <any>
 #include <functional>
 #include <initializer_list>
+#include <stdexcept>
 #include <string>
 #include <string_view>
 #include <type_traits>
@@ -104,6 +105,20 @@ void answers(const id& object, Name selector,
 /// The same for an object as the answer, whatever its class.
 inline void answers(const id& object, Name selector, const id& answer) {
   answers<id>(object, selector, [answer] { return answer; });
+}
+/// Lets the host's own method, which a category continues in, answer for this one object.
+template <class R, class... A>
+void hostAnswers(const id& object, Name selector,
+                 const std::type_identity_t<std::function<R(A...)>>& function) {
+  const Method* const grafted = object.get()->isa()->method(selector);
+  if (grafted == nullptr || grafted->replaced == nullptr) {
+    throw std::logic_error("no category took the place of that method");
+  }
+  const_cast<Method*>(grafted->replaced)->implementation =
+      methodOf<&Answering<R, A...>::answer>(selector).implementation;
+  const auto answer = make<TestAnswer>();
+  answer->function = function;
+  object.get()->attachValue(Answering<R, A...>::keyOf(selector), answer);
 }
 /// Lets this one object raise when it is asked.
 inline void raises(const id& object, Name selector) {
