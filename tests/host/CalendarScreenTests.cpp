@@ -35,31 +35,25 @@ std::vector<std::vector<int>> columnsOf(const MonthView& month) {
 const CalendarDay kToday{daysFromCivil(2026, 3, 11)};
 
 TEST(MonthCalendarTest, MonthsAreWholeAndTheUsers) {
-  struct Case {
-    const char* calendar;
-    CalendarDay first;
-    std::vector<std::string> titles;
-    std::size_t daysOfTheFirst;
-  };
-  const Case cases[] = {
+  const std::tuple<const char*, CalendarDay, std::vector<std::string>, std::size_t> cases[] = {
       {"", kToday, {"03"}, 31},
       {"", {daysFromCivil(2025, 12, 31)}, {"12", "01", "02", "03"}, 31},
       {"hebrew", {daysFromCivil(2026, 2, 17)}, {"05", "06"}, 30},  // 30 Shevat
   };
-  for (const Case& each : cases) {
-    Settings::current().calendar = each.calendar;
-    const auto months = monthsOf({each.first, kToday, kToday, {}}, 800);
+  for (const auto& [calendar, first, expected, daysOfTheFirst] : cases) {
+    Settings::current().calendar = calendar;
+    const auto months = monthsOf({first, kToday, kToday, {}}, 800);
     std::vector<std::string> titles;
     for (const Ref<MonthView>& month : months->months()) {
       const auto firstWeek = as<MonthWeekView>(month->subviewList().front());
       titles.push_back(textOf(firstWeek->monthTitleView()));
     }
-    EXPECT_EQ(titles, each.titles) << each.calendar;
+    EXPECT_EQ(titles, expected) << calendar;
     std::size_t days = 0;
     for (const auto& row : columnsOf(*months->months().front())) {
       days += row.size();
     }
-    EXPECT_EQ(days, each.daysOfTheFirst) << each.calendar;
+    EXPECT_EQ(days, daysOfTheFirst) << calendar;
   }
 }
 

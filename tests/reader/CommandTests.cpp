@@ -113,8 +113,6 @@ TEST(Narrel, ReadsTouchesAndNamesContainers) {
             std::string::npos)
       << entered;
   EXPECT_EQ(run({"tour", "--verbosity", "containers"}).find("[day]\n" + entered), 0U);
-  // Without the plug-in what is drawn is silent.
-  EXPECT_EQ(run({"read", "day", "--without-plugin"}).find("calories"), std::string::npos);
 }
 
 TEST(Narrel, ValidatesTheHostContract) {
