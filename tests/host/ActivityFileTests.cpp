@@ -1,13 +1,12 @@
 #include <gtest/gtest.h>
 
-#include <filesystem>
-#include <fstream>
+#include <tuple>
 
 #include "host/ActivityFile.h"
 #include "host/screens/workouts/WorkoutRecords.h"
-#include "platform/foundation/NSBundle.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/Settings.h"
+#include "tests/support/Cases.h"
 
 namespace tavro {
 namespace {
@@ -16,34 +15,9 @@ Workout readSample(const std::string& name) {
   return readActivityFile(TAVRO_SOURCE "/tests/data/" + name);
 }
 
-std::string writtenFile(const std::string& text) {
-  std::string path =
-      testing::TempDir() + testing::UnitTest::GetInstance()->current_test_info()->name();
-  std::ofstream(path, std::ios::binary) << text;
-  return path;
-}
-
 Workout readText(const std::string& text) {
-  const std::string path = writtenFile(text);
-  Workout workout = readActivityFile(path);
-  std::filesystem::remove(path);
-  return workout;
-}
-
-/// What reading the text complains of, without the name of the file; empty when it is content.
-std::string complaintAbout(const std::string& text) {
-  const std::string path = writtenFile(text);
-  std::string complaint;
-  try {
-    readActivityFile(path);
-  } catch (const FileError& error) {
-    complaint = error.what();
-    EXPECT_TRUE(complaint.starts_with(path + ":")) << complaint;
-    EXPECT_EQ(complaint.find('\n'), std::string::npos) << complaint;
-    complaint.erase(0, std::min(complaint.size(), path.size() + 1));
-  }
-  std::filesystem::remove(path);
-  return complaint;
+  const TemporaryFolder folder;
+  return readActivityFile(folder.file("activity", text));
 }
 
 /// A track of GPX, its points from the second line on.
@@ -134,10 +108,7 @@ TEST(ActivityFile, PrefixesPlayNoPart) {
 }
 
 TEST(ActivityFile, NamesOfActivities) {
-  const struct {
-    const char* name;
-    HKWorkoutActivityType type;
-  } cases[] = {
+  const std::pair<const char*, HKWorkoutActivityType> cases[] = {
       {"Running", HKWorkoutActivityType::running}, {"Biking", HKWorkoutActivityType::cycling},
       {"WALKING", HKWorkoutActivityType::walking}, {"swim", HKWorkoutActivityType::swimming},
       {"Other", HKWorkoutActivityType::other},     {"", HKWorkoutActivityType::other},
@@ -150,11 +121,7 @@ TEST(ActivityFile, NamesOfActivities) {
 }
 
 TEST(ActivityFile, TimesAreReadToTheMoment) {
-  const struct {
-    const char* time;
-    const char* iso;
-    double later;  ///< how long after it 06:10 is
-  } cases[] = {
+  const std::tuple<const char*, const char*, double> cases[] = {
       {"2026-03-11T06:00:00Z", "2026-03-11T06:00:00Z", 600},
       {" 2026-03-11T06:00:00.250Z\n", "2026-03-11T06:00:00Z", 599.75},
       {"2026-03-11T06:00:00.", "2026-03-11T06:00:00Z", 600},
@@ -194,10 +161,7 @@ TEST(ActivityFile, TheFilesOwnDistanceCountsUnlessItFalls) {
 
 TEST(ActivityFile, NamesLineAndReason) {
   const std::string good = gpxPoint(kSix);
-  const struct {
-    std::string text;
-    const char* complaint;
-  } cases[] = {
+  const std::pair<std::string, const char*> cases[] = {
       // Not an activity at all
       {"", "1: the file is empty"},
       {" \n\n", "1: the file is empty"},
@@ -240,7 +204,8 @@ TEST(ActivityFile, NamesLineAndReason) {
   };
   for (const auto& [text, complaint] : cases) {
     SCOPED_TRACE(text);
-    const std::string found = complaintAbout(text);
+    const std::string found =
+        complaintAbout(text, [](const std::string& path) { readActivityFile(path); });
     EXPECT_TRUE(found.starts_with(complaint)) << found;
   }
 }

@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <tuple>
+
 #include "host/Dates.h"
 #include "host/screens/calendar/MonthScrollViewController.h"
 #include "platform/foundation/Settings.h"
@@ -33,55 +35,43 @@ std::vector<std::vector<int>> columnsOf(const MonthView& month) {
 const CalendarDay kToday{daysFromCivil(2026, 3, 11)};
 
 TEST(MonthCalendarTest, MonthsAreWholeAndTheUsers) {
-  struct Case {
-    const char* calendar;
-    CalendarDay first;
-    std::vector<std::string> titles;
-    std::size_t daysOfTheFirst;
-  };
-  const Case cases[] = {
+  const std::tuple<const char*, CalendarDay, std::vector<std::string>, std::size_t> cases[] = {
       {"", kToday, {"03"}, 31},
       {"", {daysFromCivil(2025, 12, 31)}, {"12", "01", "02", "03"}, 31},
       {"hebrew", {daysFromCivil(2026, 2, 17)}, {"05", "06"}, 30},  // 30 Shevat
   };
-  for (const Case& each : cases) {
-    Settings::current().calendar = each.calendar;
-    const auto months = monthsOf({each.first, kToday, kToday, {}}, 800);
+  for (const auto& [calendar, first, expected, daysOfTheFirst] : cases) {
+    Settings::current().calendar = calendar;
+    const auto months = monthsOf({first, kToday, kToday, {}}, 800);
     std::vector<std::string> titles;
     for (const Ref<MonthView>& month : months->months()) {
       const auto firstWeek = as<MonthWeekView>(month->subviewList().front());
       titles.push_back(textOf(firstWeek->monthTitleView()));
     }
-    EXPECT_EQ(titles, each.titles) << each.calendar;
+    EXPECT_EQ(titles, expected) << calendar;
     std::size_t days = 0;
     for (const auto& row : columnsOf(*months->months().front())) {
       days += row.size();
     }
-    EXPECT_EQ(days, each.daysOfTheFirst) << each.calendar;
+    EXPECT_EQ(days, daysOfTheFirst) << calendar;
   }
 }
 
 TEST(MonthCalendarTest, WeeksBeginWhereTheUsersDo) {
-  struct Case {
-    std::int64_t firstWeekday;
-    const char* locale;
-    std::vector<int> firstRow;  // of March 2026, whose 1st is a Sunday
-    std::size_t rows;
-  };
-  const Case cases[] = {
+  const std::tuple<std::int64_t, const char*, std::vector<int>, std::size_t> cases[] = {
       {2, "en_US", {6}, 6},
       {1, "en_US", {0, 1, 2, 3, 4, 5, 6}, 5},
       {7, "en_US", {1, 2, 3, 4, 5, 6}, 5},
       {1, "he_IL", {6, 5, 4, 3, 2, 1, 0}, 5},
       {2, "ar_EG", {0}, 6},
   };
-  for (const Case& each : cases) {
-    Settings::current().firstWeekday = each.firstWeekday;
-    Settings::current().locale = each.locale;
+  for (const auto& [firstWeekday, locale, firstRow, expected] : cases) {
+    Settings::current().firstWeekday = firstWeekday;
+    Settings::current().locale = locale;
     const auto months = monthsOf({kToday, kToday, kToday, {}}, 800);
     const auto rows = columnsOf(*months->months().front());
-    EXPECT_EQ(rows.front(), each.firstRow) << each.locale << " " << each.firstWeekday;
-    EXPECT_EQ(rows.size(), each.rows) << each.locale << " " << each.firstWeekday;
+    EXPECT_EQ(rows.front(), firstRow) << locale << " " << firstWeekday;
+    EXPECT_EQ(rows.size(), expected) << locale << " " << firstWeekday;
   }
 }
 

@@ -1,5 +1,6 @@
 #include <cmath>
 #include <limits>
+#include <tuple>
 
 #include "tests/platform/FoundationTesting.h"
 
@@ -21,49 +22,49 @@ TEST_F(DateTest, NowIsTheSettingsMoment) {
   EXPECT_FALSE(dateByAddingTimeInterval(nullptr, 1));
 }
 
-struct IsoCase {
-  std::string_view text;
-  std::string_view expected;
-};
-
-class IsoTest : public FoundationTest, public ::testing::WithParamInterface<IsoCase> {};
-
-TEST_P(IsoTest, ReadsExactlyTheThreeForms) {
-  const std::optional<double> seconds = secondsFromIso(GetParam().text);
-  EXPECT_EQ(seconds ? utc(dateWithSeconds(*seconds)) : "nothing", GetParam().expected)
-      << GetParam().text;
+TEST_F(DateTest, MomentsAreReadInExactlyThreeForms) {
+  const std::pair<std::string_view, std::string_view> cases[] = {
+      {"2026-03-02", "2026-03-02 05:00:00 +0000"},
+      {"2026-03-02T08:15", "2026-03-02 13:15:00 +0000"},
+      {"2026-07-02T08:15:30", "2026-07-02 12:15:30 +0000"},
+      {"2026-03-02T08:15Z", "2026-03-02 08:15:00 +0000"},
+      {"2024-02-29Z", "2024-02-29 00:00:00 +0000"},
+      {"2000-02-29T23:59:59Z", "2000-02-29 23:59:59 +0000"},
+      {"1969-12-31T23:59:59Z", "1969-12-31 23:59:59 +0000"},
+      {"0001-01-01Z", "0001-01-01 00:00:00 +0000"},
+      // Proleptic: these days fell out of the Julian reckoning.
+      {"1582-10-10T00:00Z", "1582-10-10 00:00:00 +0000"},
+      // The clocks skip 02:30, and show 01:30 twice.
+      {"2026-03-08T02:30", "2026-03-08 07:00:00 +0000"},
+      {"2026-11-01T01:30", "2026-11-01 05:30:00 +0000"},
+  };
+  for (const auto& [text, expected] : cases) {
+    EXPECT_EQ(utc(at(text)), expected) << text;
+  }
+  for (const char* const text : {"",
+                                 "Z",
+                                 "2026-3-2",
+                                 "2026-02-29",
+                                 "1900-02-29",
+                                 "2026-13-01",
+                                 "2026-00-01",
+                                 "2026-04-31",
+                                 "2026-01-00",
+                                 "2026-03-02T24:00",
+                                 "2026-03-02T08:60",
+                                 "2026-03-02T08:15:60",
+                                 "2026-03-02 08:15",
+                                 "2026-03-02T08",
+                                 "2026-03-02ZZ",
+                                 "2026-03-02z",
+                                 " 026-03-02",
+                                 "+026-03-02",
+                                 "2026-03-dd",
+                                 "9999-12-31Td3:59:59Z",
+                                 "2026-03-02T08:15+01"}) {
+    EXPECT_FALSE(secondsFromIso(text)) << text;
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Dates, IsoTest,
-    ::testing::Values(IsoCase{"2026-03-02", "2026-03-02 05:00:00 +0000"},
-                      IsoCase{"2026-03-02T08:15", "2026-03-02 13:15:00 +0000"},
-                      IsoCase{"2026-07-02T08:15:30", "2026-07-02 12:15:30 +0000"},
-                      IsoCase{"2026-03-02T08:15Z", "2026-03-02 08:15:00 +0000"},
-                      IsoCase{"2024-02-29Z", "2024-02-29 00:00:00 +0000"},
-                      IsoCase{"2000-02-29T23:59:59Z", "2000-02-29 23:59:59 +0000"},
-                      IsoCase{"1969-12-31T23:59:59Z", "1969-12-31 23:59:59 +0000"},
-                      IsoCase{"0001-01-01Z", "0001-01-01 00:00:00 +0000"},
-                      // Proleptic: these days fell out of the Julian reckoning.
-                      IsoCase{"1582-10-10T00:00Z", "1582-10-10 00:00:00 +0000"},
-                      // The clocks skip 02:30, and show 01:30 twice.
-                      IsoCase{"2026-03-08T02:30", "2026-03-08 07:00:00 +0000"},
-                      IsoCase{"2026-11-01T01:30", "2026-11-01 05:30:00 +0000"}));
-
-INSTANTIATE_TEST_SUITE_P(
-    NotDates, IsoTest,
-    ::testing::Values(IsoCase{"", "nothing"}, IsoCase{"Z", "nothing"},
-                      IsoCase{"2026-3-2", "nothing"}, IsoCase{"2026-02-29", "nothing"},
-                      IsoCase{"1900-02-29", "nothing"}, IsoCase{"2026-13-01", "nothing"},
-                      IsoCase{"2026-00-01", "nothing"}, IsoCase{"2026-04-31", "nothing"},
-                      IsoCase{"9999-12-31Td3:59:59Z", "nothing"}, IsoCase{"2026-01-00", "nothing"},
-                      IsoCase{"2026-03-02T24:00", "nothing"},
-                      IsoCase{"2026-03-02T08:60", "nothing"},
-                      IsoCase{"2026-03-02T08:15:60", "nothing"},
-                      IsoCase{"2026-03-02 08:15", "nothing"}, IsoCase{"2026-03-02T08", "nothing"},
-                      IsoCase{"2026-03-02ZZ", "nothing"}, IsoCase{"2026-03-02z", "nothing"},
-                      IsoCase{" 026-03-02", "nothing"}, IsoCase{"+026-03-02", "nothing"},
-                      IsoCase{"2026-03-dd", "nothing"}, IsoCase{"2026-03-02T08:15+01", "nothing"}));
 
 TEST_F(DateTest, CivilDaysCountThroughLeapYears) {
   EXPECT_EQ(daysFromCivil(1970, 1, 1), 0);
@@ -146,72 +147,41 @@ TEST_F(DateTest, PartsOutOfRangeCarryOver) {
   EXPECT_EQ(utc(calendar->dateFromComponents(*parts)), "2027-02-01 04:59:00 +0000");
 }
 
-/// The first moment of a day is in that day, and the moment before is not: asked of every day of a
-/// year in zones that change their clocks at, before and after midnight.
-class StartOfDayTest : public FoundationTest, public ::testing::WithParamInterface<const char*> {};
-
-TEST_P(StartOfDayTest, IsTheFirstMomentOfEveryDay) {
-  settings_.timeZone = GetParam();
-  const Ref<NSCalendar> calendar = currentCalendar();
-  const double first = *secondsFromIso("2018-01-01T12:00");
-  for (int day = 0; day < 366; ++day) {
-    const Ref<NSDate> noon = dateWithSeconds(first + day * kDay);
-    const Ref<NSDate> start = calendar->startOfDayForDate(noon);
-    const std::int64_t today = calendar->componentsFromDate(noon)->day;
-    ASSERT_LE(start->seconds, noon->seconds) << utc(noon);
-    ASSERT_EQ(calendar->componentsFromDate(start)->day, today) << utc(noon);
-    const Ref<NSDate> before = dateWithSeconds(start->seconds - 1);
-    ASSERT_NE(calendar->componentsFromDate(before)->day, today) << utc(noon);
-    ASSERT_EQ(calendar->startOfDayForDate(start)->seconds, start->seconds) << utc(noon);
+// Asked of every day of a year in zones that change their clocks at, before and after midnight.
+TEST_F(DateTest, ADayBeginsWithItsFirstMoment) {
+  for (const char* const zone :
+       {"America/New_York", "America/Sao_Paulo", "America/Havana", "Asia/Beirut", "Atlantic/Azores",
+        "Australia/Lord_Howe", "Pacific/Apia"}) {
+    settings_.timeZone = zone;
+    const Ref<NSCalendar> calendar = currentCalendar();
+    const double first = *secondsFromIso("2018-01-01T12:00");
+    for (int day = 0; day < 366; ++day) {
+      SCOPED_TRACE(zone + std::to_string(day));
+      const Ref<NSDate> noon = dateWithSeconds(first + day * kDay);
+      const Ref<NSDate> start = calendar->startOfDayForDate(noon);
+      const std::int64_t today = calendar->componentsFromDate(noon)->day;
+      ASSERT_LE(start->seconds, noon->seconds);
+      ASSERT_EQ(calendar->componentsFromDate(start)->day, today);
+      const Ref<NSDate> before = dateWithSeconds(start->seconds - 1);
+      ASSERT_NE(calendar->componentsFromDate(before)->day, today);
+      ASSERT_EQ(calendar->startOfDayForDate(start)->seconds, start->seconds);
+    }
   }
-}
-
-INSTANTIATE_TEST_SUITE_P(Zones, StartOfDayTest,
-                         ::testing::Values("America/New_York", "America/Sao_Paulo",
-                                           "America/Havana", "Asia/Beirut", "Atlantic/Azores",
-                                           "Australia/Lord_Howe", "Pacific/Apia"),
-                         [](const auto& each) {
-                           std::string name = each.param;
-                           std::erase_if(name, [](char c) { return c == '/' || c == '_'; });
-                           return name;
-                         });
-
-TEST_F(DateTest, StartsOfDaysAroundClockChanges) {
-  const struct {
-    std::string timeZone;
-    std::string_view moment;
-    std::string_view start;
-  } cases[] = {
-      {"America/New_York", "2026-03-08T12:00", "2026-03-08 05:00:00 +0000"},
-      {"America/New_York", "2026-11-01T12:00", "2026-11-01 04:00:00 +0000"},
-      {"America/Sao_Paulo", "2018-11-04T12:00", "2018-11-04 03:00:00 +0000"},  // begins at 01:00
-      {"America/Havana", "2018-11-04T12:00", "2018-11-04 04:00:00 +0000"},  // midnight comes twice
-  };
-  for (const auto& each : cases) {
-    settings_.timeZone = each.timeZone;
-    EXPECT_EQ(utc(currentCalendar()->startOfDayForDate(at(each.moment))), each.start)
-        << each.timeZone;
-  }
-  EXPECT_FALSE(currentCalendar()->startOfDayForDate(nullptr));
 }
 
 TEST_F(DateTest, AddedDaysKeepTheTimeOfDay) {
-  const struct {
-    std::string_view from;
-    std::int64_t days;
-    std::string_view to;
-  } cases[] = {
+  const std::tuple<std::string_view, std::int64_t, std::string_view> cases[] = {
       {"2026-03-07T08:00", 1, "2026-03-08T08:00"},  // a day of 23 hours
       {"2026-10-31T08:00", 2, "2026-11-02T08:00"},  // a day of 25 hours
       {"2026-03-09T08:00", -2, "2026-03-07T08:00"}, {"2024-02-28T00:00", 366, "2025-02-28T00:00"},
       {"2026-03-07T02:30", 1, "2026-03-08T03:00"},  // 02:30 is skipped
   };
-  for (const auto& each : cases) {
-    EXPECT_EQ(utc(currentCalendar()->dateByAddingDays(at(each.from), each.days)), utc(at(each.to)))
-        << each.from;
+  for (const auto& [from, days, to] : cases) {
+    EXPECT_EQ(utc(currentCalendar()->dateByAddingDays(at(from), days)), utc(at(to))) << from;
   }
   EXPECT_FALSE(currentCalendar()->dateByAddingDays(nullptr, 1));
   EXPECT_FALSE(currentCalendar()->componentsFromDate(nullptr));
+  EXPECT_FALSE(currentCalendar()->startOfDayForDate(nullptr));
 }
 
 TEST_F(DateTest, AbsurdMomentsAndPartsAreHarmless) {

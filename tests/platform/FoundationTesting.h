@@ -2,9 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
-#include <filesystem>
-#include <fstream>
 #include <ostream>
 #include <string>
 #include <vector>
@@ -12,6 +9,7 @@
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/NSString.h"
 #include "platform/foundation/Settings.h"
+#include "tests/support/Files.h"
 
 namespace tavro::testing {
 
@@ -38,32 +36,6 @@ class FoundationTest : public ::testing::Test {
   std::string timeZone_ = settings_.timeZone;
   std::string calendar_ = settings_.calendar;
   double now_ = settings_.now;
-};
-
-/// A folder that exists for the length of a test.
-class TemporaryFolder {
- public:
-  TemporaryFolder() {
-    std::string path = (std::filesystem::temp_directory_path() / "tavro-XXXXXX").string();
-    if (mkdtemp(path.data()) == nullptr) {
-      throw std::runtime_error("no temporary folder can be made");
-    }
-    path_ = path;
-  }
-  ~TemporaryFolder() { std::filesystem::remove_all(path_); }
-  TemporaryFolder(const TemporaryFolder&) = delete;
-  TemporaryFolder& operator=(const TemporaryFolder&) = delete;
-
-  [[nodiscard]] std::string path() const { return path_.string(); }
-  std::string write(const std::string& name, std::string_view text) const {
-    const std::filesystem::path file = path_ / name;
-    std::filesystem::create_directories(file.parent_path());
-    std::ofstream(file, std::ios::binary) << text;
-    return file.string();
-  }
-
- private:
-  std::filesystem::path path_;
 };
 
 /// The text for comparison; nil is told from the empty text.

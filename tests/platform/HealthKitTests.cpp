@@ -8,30 +8,24 @@
 #include "platform/healthkit/HKActivitySummary.h"
 #include "platform/healthkit/HKHealthStore.h"
 #include "platform/healthkit/HKQuantity.h"
-#include "platform/healthkit/HKWorkout.h"
-#include "platform/runtime/Dispatch.h"
 
 namespace tavro {
 namespace {
 
+Ref<HKUnit> per(const Ref<HKUnit>& unit, const Ref<HKUnit>& other) {
+  return unit->unitDividedByUnit(other);
+}
 Ref<HKUnit> millilitersPerKilogramMinute() {
-  return HKUnit::literUnitWithMetricPrefix(HKMetricPrefix::milli)
-      ->unitDividedByUnit(HKUnit::gramUnitWithMetricPrefix(HKMetricPrefix::kilo))
-      ->unitDividedByUnit(HKUnit::minuteUnit());
+  return per(per(HKUnit::literUnitWithMetricPrefix(HKMetricPrefix::milli),
+                 HKUnit::gramUnitWithMetricPrefix(HKMetricPrefix::kilo)),
+             HKUnit::minuteUnit());
 }
 Ref<HKUnit> kilometersPerHour() {
-  return HKUnit::meterUnitWithMetricPrefix(HKMetricPrefix::kilo)
-      ->unitDividedByUnit(HKUnit::hourUnit());
+  return per(HKUnit::meterUnitWithMetricPrefix(HKMetricPrefix::kilo), HKUnit::hourUnit());
 }
-Ref<HKUnit> metersPerSecond() {
-  return HKUnit::meterUnit()->unitDividedByUnit(HKUnit::secondUnit());
-}
-Ref<HKUnit> countsPerMinute() {
-  return HKUnit::countUnit()->unitDividedByUnit(HKUnit::minuteUnit());
-}
-Ref<HKUnit> countsPerSecond() {
-  return HKUnit::countUnit()->unitDividedByUnit(HKUnit::secondUnit());
-}
+Ref<HKUnit> metersPerSecond() { return per(HKUnit::meterUnit(), HKUnit::secondUnit()); }
+Ref<HKUnit> countsPerMinute() { return per(HKUnit::countUnit(), HKUnit::minuteUnit()); }
+Ref<HKUnit> countsPerSecond() { return per(HKUnit::countUnit(), HKUnit::secondUnit()); }
 
 TEST(HKUnit, PrintsItsFactors) {
   const std::pair<Ref<HKUnit>, const char*> cases[] = {
@@ -48,10 +42,7 @@ TEST(HKUnit, PrintsItsFactors) {
       {metersPerSecond()->unitDividedByUnit(HKUnit::secondUnit()), "m/s^2"},
       {HKUnit::minuteUnit()->unitDividedByUnit(HKUnit::minuteUnit()), "1"},
       {HKUnit::countUnit()->unitDividedByUnit(countsPerMinute()), "min"},
-      {HKUnit::hourUnit()
-           ->unitDividedByUnit(kilometersPerHour())
-           ->unitDividedByUnit(HKUnit::hourUnit()),
-       "hr/km"},
+      {per(per(HKUnit::hourUnit(), kilometersPerHour()), HKUnit::hourUnit()), "hr/km"},
   };
   for (const auto& [unit, text] : cases) {
     EXPECT_EQ(utf8(unit->unitString()), text);
@@ -59,16 +50,11 @@ TEST(HKUnit, PrintsItsFactors) {
   }
 }
 
-TEST(HKUnit, IsMadeByClassMessages) {
+TEST(HKUnit, RefusesPrefixesAndUnitsThatAreNone) {
   Class* const unit = Class::named("HKUnit");
-  const id milliliter = send<id>(unit, "literUnitWithMetricPrefix:", 4);
-  const id kilogram = send<id>(unit, "gramUnitWithMetricPrefix:", 9);
-  const id perKilogram = send<id>(milliliter, "unitDividedByUnit:", kilogram);
-  EXPECT_EQ(utf8(send<id>(perKilogram, "unitString")), "mL/kg");
-
   EXPECT_THROW(send<id>(unit, "meterUnitWithMetricPrefix:", 13), NSException);
   EXPECT_THROW(send<id>(unit, "meterUnitWithMetricPrefix:", -1), NSException);
-  EXPECT_THROW(send<id>(milliliter, "unitDividedByUnit:", id()), NSException);
+  EXPECT_THROW(send<id>(HKUnit::meterUnit(), "unitDividedByUnit:", id()), NSException);
 }
 
 TEST(HKQuantity, ConvertsBetweenUnitsOfOneDimension) {
@@ -76,9 +62,8 @@ TEST(HKQuantity, ConvertsBetweenUnitsOfOneDimension) {
   const Ref<HKUnit> kilogram = HKUnit::gramUnitWithMetricPrefix(HKMetricPrefix::kilo);
   const Ref<HKUnit> centimeter = HKUnit::meterUnitWithMetricPrefix(HKMetricPrefix::centi);
   const Ref<HKUnit> milliliter = HKUnit::literUnitWithMetricPrefix(HKMetricPrefix::milli);
-  const Ref<HKUnit> literPerGramHour = HKUnit::literUnit()
-                                           ->unitDividedByUnit(HKUnit::gramUnit())
-                                           ->unitDividedByUnit(HKUnit::hourUnit());
+  const Ref<HKUnit> literPerGramHour =
+      per(per(HKUnit::literUnit(), HKUnit::gramUnit()), HKUnit::hourUnit());
   const std::tuple<double, Ref<HKUnit>, double, Ref<HKUnit>> cases[] = {
       {5000, HKUnit::meterUnit(), 5, kilometer},
       {1.5, HKUnit::hourUnit(), 90, HKUnit::minuteUnit()},
@@ -132,10 +117,7 @@ TEST(HKQuantity, OtherDimensionsAreIncompatibleAndRaise) {
 
 TEST(HKActivitySummary, FractionsOfTheGoals) {
   const double notANumber = std::nan("");
-  const struct {
-    HKActivitySummary::Ring ring;
-    double fraction;
-  } cases[] = {
+  const std::pair<HKActivitySummary::Ring, double> cases[] = {
       {{250, 500}, 0.5},
       {{500, 500}, 1.0},
       {{685, 500}, 1.37},
@@ -175,7 +157,6 @@ class HealthKitSettings : public testing::Test {
   void TearDown() override {
     settings.timeZone = "UTC";
     settings.calendar.clear();
-    settings.firstWeekday = 2;
     settings.wheelchairUse = 0;
     settings.wheelchairUseFails = false;
     settings.wheelchairQueries = 0;
@@ -252,11 +233,6 @@ TEST(HKActivityCache, NothingHasNoIndex) {
   EXPECT_EQ(_HKCacheIndexFromDateComponents(nullptr), kNoCacheIndex);
 }
 
-TEST_F(HealthKitSettings, FirstWeekdayIsTheUsers) {
-  settings.firstWeekday = 7;
-  EXPECT_EQ(HKFirstDayOfWeekForWeeklyGoalCalculations(), 7);
-}
-
 TEST_F(HealthKitSettings, WheelchairQueryAnswersOrReports) {
   const id store = make<HKHealthStore>();
   for (const std::int64_t use : {0, 1, 2}) {
@@ -273,59 +249,6 @@ TEST_F(HealthKitSettings, WheelchairQueryAnswersOrReports) {
   EXPECT_TRUE(as<NSError>(error));
   EXPECT_FALSE(send<id>(store, "wheelchairUseWithError:", static_cast<id*>(nullptr)));
   EXPECT_EQ(settings.wheelchairQueries, 5);
-}
-
-TEST_F(HealthKitSettings, WheelchairQueryRunsOnTheWorkerThread) {
-  settings.wheelchairUse = 2;
-  std::int64_t use = -1;
-  bool hasError = false;
-  GlobalQueue::shared().async([&] {
-    id error;
-    const Ref<HKHealthStore> store = make<HKHealthStore>();
-    use = send<std::int64_t>(send<id>(store, "wheelchairUseWithError:", &error), "wheelchairUse");
-    settings.wheelchairUseFails = true;
-    hasError = !send<id>(store, "wheelchairUseWithError:", &error) && error;
-  });
-  GlobalQueue::shared().drain();
-  EXPECT_EQ(use, 2);
-  EXPECT_TRUE(hasError);
-}
-
-TEST(HKWorkout, AnswersByMessage) {
-  const Ref<HKSource> watch = make<HKSource>();
-  watch->sourceName = string("Robin's Watch");
-  watch->isWatch = true;
-  const Ref<HKSourceRevision> revision = make<HKSourceRevision>();
-  revision->recorder = watch;
-  const Ref<HKWorkout> ride = make<HKWorkout>();
-  ride->record = {.activityType = HKWorkoutActivityType::cycling,
-                  .startDate = dateWithSeconds(100),
-                  .endDate = dateWithSeconds(1000),
-                  .duration = 840,
-                  .totalEnergyBurned = HKQuantity::quantityWithUnit(HKUnit::kilocalorieUnit(), 210),
-                  .totalDistance = nullptr,
-                  .sourceRevision = revision};
-
-  EXPECT_EQ(send<std::int64_t>(ride, "workoutActivityType"), 13);
-  EXPECT_EQ(as<NSDate>(send<id>(ride, "startDate"))->seconds, 100);
-  EXPECT_EQ(as<NSDate>(send<id>(ride, "endDate"))->seconds, 1000);
-  EXPECT_EQ(send<double>(ride, "duration"), 840);
-  EXPECT_EQ(send<double>(send<id>(ride, "totalEnergyBurned"),
-                         "doubleValueForUnit:", HKUnit::kilocalorieUnit()),
-            210);
-  EXPECT_FALSE(send<id>(ride, "totalDistance"));
-  const id source = send<id>(send<id>(ride, "sourceRevision"), "source");
-  EXPECT_EQ(utf8(send<id>(source, "name")), "Robin's Watch");
-  EXPECT_TRUE(send<bool>(source, "_isOrlamWatch"));
-}
-
-TEST(HKHeartRateSummaryReading, AnswersByMessage) {
-  const Ref<HKHeartRateSummaryReading> reading = make<HKHeartRateSummaryReading>();
-  reading->moment = dateWithSeconds(60);
-  reading->heartRate = HKQuantity::quantityWithUnit(countsPerMinute(), 90);
-  EXPECT_EQ(as<NSDate>(send<id>(reading, "date"))->seconds, 60);
-  EXPECT_DOUBLE_EQ(
-      send<double>(send<id>(reading, "quantity"), "doubleValueForUnit:", countsPerSecond()), 1.5);
 }
 
 }  // namespace

@@ -81,18 +81,5 @@ TEST_F(IcuCacheTest, FormattersShareWhatIcuMade) {
   EXPECT_EQ(created(formatDay), 2U);
 }
 
-TEST_F(IcuCacheTest, ManyTemplatesKeepOnlySomeFormatters) {
-  const Ref<NSDate> date = at("2026-03-02");
-  const auto format = [&](std::size_t index) {
-    const std::string pattern = "yyyy '" + std::to_string(index) + "'";
-    EXPECT_TRUE(dateStringForFormat(date, pattern));
-  };
-  for (std::size_t index = 0; index <= kIcuCacheCapacity; ++index) {
-    EXPECT_EQ(created([&] { format(index); }), 1U) << index;
-  }
-  EXPECT_EQ(created([&] { format(kIcuCacheCapacity); }), 0U);
-  EXPECT_EQ(created([&] { format(0); }), 1U);
-}
-
 }  // namespace
 }  // namespace tavro

@@ -5,6 +5,7 @@
 #include "platform/foundation/NSValue.h"
 #include "platform/uikit/UIControls.h"
 #include "tests/platform/RuntimeTesting.h"
+#include "tests/support/Elements.h"
 
 namespace tavro {
 namespace {
@@ -35,15 +36,12 @@ std::string markedParts(const id& text) {
 }
 
 /// Answers nothing without raising.
-class Grumpy : public UIView {
- public:
-  static constexpr Name className = "JoinerTestGrumpy";
-  id label() { throw 1; }
-  CGRect raisingFrame() { throw 1; }
-};
-const Registered grumpyClass = defineClass<Grumpy, UIView>()
-                                   .method<&Grumpy::label>("accessibilityLabel")
-                                   .method<&Grumpy::raisingFrame>("accessibilityFrame");
+Ref<UIView> grumpy() {
+  auto view = makeView<UIView>();
+  raises(view, "accessibilityLabel");
+  answers<CGRect>(view, "accessibilityFrame", []() -> CGRect { throw 1; });
+  return view;
+}
 
 TEST(JoinerTests, EveryJoinerKeepsWhatIsThereInItsOrder) {
   const struct {
@@ -123,35 +121,21 @@ TEST(JoinerTests, ElementsSpeakTheirLabelsAndInvisibleViewsNothing) {
   const auto element = accessibilityElementWithContainer(parent);
   send<void>(element, "setAccessibilityLabel:", marked(u"75", 0, 2));
   const id joined = AXLabelForElements(arrayWithObjects(
-      {shown, make<Grumpy>(), kHiddenSoSilent, plain("text"), kTransparentSoSilent,
-       kInsideHiddenSoSilent, kUnlabelled, kOverriddenSoHeard, element, id(classOf<UIView>())}));
+      {shown, grumpy(), kHiddenSoSilent, plain("text"), kTransparentSoSilent, kInsideHiddenSoSilent,
+       kUnlabelled, kOverriddenSoHeard, element, id(classOf<UIView>())}));
   EXPECT_EQ(heard(joined), "shown, text, overridden, 75");
   EXPECT_EQ(markedParts(joined), "[75]");
 }
 
-/// Has its labels under keys.
-class Card : public UIView {
- public:
-  static constexpr Name className = "JoinerTestCard";
-  Ref<UILabel> title = makeLabel("Title");
-  Ref<UILabel> detail = makeLabel("Detail");
-  Ref<NSString> text = string("text");
-  std::int64_t count = 3;
-  Ref<UILabel> none;
-};
-const Registered cardClass = defineClass<Card, UIView>()
-                                 .variable<&Card::title>("_title")
-                                 .variable<&Card::detail>("_detail")
-                                 .variable<&Card::text>("_text")
-                                 .variable<&Card::count>("_count")
-                                 .variable<&Card::none>("_none");
-
 TEST(JoinerTests, LabelKeysSpeakWhatIsUnderThem) {
-  const auto card = makeView<Card>();
-  const struct {
-    const char* keys;
-    const char* heard;
-  } cases[] = {
+  const auto card = makeView<UIView>();
+  const auto title = makeLabel("Title");
+  answers(card, "_title", title);
+  answers(card, "_detail", makeLabel("Detail"));
+  answers(card, "_text", string("text"));
+  answers(card, "_none", nullptr);
+  answers<std::int64_t>(card, "_count", [] { return 3; });
+  const std::pair<const char*, const char*> cases[] = {
       {"_title, _detail", "Title, Detail"},
       {"detail, title", "Detail, Title"},
       {"_title, noSuchKey, _none, _detail", "Title, Detail"},
@@ -166,10 +150,10 @@ TEST(JoinerTests, LabelKeysSpeakWhatIsUnderThem) {
   const auto labels = [&](const char* keys) {
     return heard(send<id>(card, "_accessibilityStringForLabelKeyValues:", string(keys)));
   };
-  for (const auto& each : cases) {
-    EXPECT_EQ(labels(each.keys), each.heard) << each.keys;
+  for (const auto& [keys, expected] : cases) {
+    EXPECT_EQ(labels(keys), expected) << keys;
   }
-  card->title->setHidden(true);
+  title->setHidden(true);
   EXPECT_EQ(labels("_title, _detail"), "Detail");
 }
 
@@ -185,16 +169,16 @@ TEST(JoinerTests, FramesAreJoinedOnScreen) {
   EXPECT_EQ(unionOf({left, right}), CGRect(100, 200, 60, 15));
   EXPECT_EQ(unionOf({right, left}), CGRect(100, 200, 60, 15));
   EXPECT_EQ(unionOf({right}), CGRect(140, 200, 20, 5));
-  EXPECT_EQ(unionOf({make<Grumpy>(), right, make<Grumpy>()}), CGRect(140, 200, 20, 5))
+  EXPECT_EQ(unionOf({grumpy(), right, grumpy()}), CGRect(140, 200, 20, 5))
       << "an object that raises does not stretch the frame to the corner of the screen";
   EXPECT_EQ(unionOf({}), CGRect());
   EXPECT_EQ(UIAXFrameForElements(nullptr), CGRect());
   const auto aggregate = make<UIAccessibilityAggregateElement>();
   send<id>(aggregate, "initWithAccessibilityContainer:representedElements:", parent,
            arrayWithObjects({left, right}));
-  EXPECT_EQ(send<CGRect>(aggregate, "accessibilityFrame"), CGRect(100, 200, 60, 15));
+  EXPECT_EQ(frameOf(aggregate), CGRect(100, 200, 60, 15));
   left->setFrame({0, 45, 5, 5});
-  EXPECT_EQ(send<CGRect>(aggregate, "accessibilityFrame"), CGRect(100, 200, 60, 50));
+  EXPECT_EQ(frameOf(aggregate), CGRect(100, 200, 60, 50));
 }
 
 /// Everything that the text of a subhierarchy tells apart, each at its own height.
@@ -211,7 +195,7 @@ class SubhierarchyTests : public ::testing::Test {
     hidden->setHidden(true);
     group = add(makeView<UIView>());
     group->addSubview(makeLabel("inside"));
-    root->addSubview(make<Grumpy>());
+    root->addSubview(grumpy());
   }
   template <class View>
   Ref<View> add(const Ref<View>& view) {
@@ -242,7 +226,7 @@ TEST_F(SubhierarchyTests, TheFlagsChooseWhatIsIncluded) {
 
 TEST_F(SubhierarchyTests, TheRootsOwnNatureAndPlaceDoNotMatter) {
   send<void>(root, "setIsAccessibilityElement:", true);
-  send<void>(root, "setAccessibilityLabel:", string("root"));
+  setLabel(root, "root");
   send<void>(root, "_accessibilityAddTrait:", UIAccessibilityTraitHeader);
   EXPECT_EQ(text(false, true), "button, plain, inside");
 }
@@ -254,11 +238,11 @@ TEST_F(SubhierarchyTests, ExclusionsAreLeftOutWithAllBelowThem) {
 
 TEST_F(SubhierarchyTests, AnElementIsALeafAndListsAreFollowed) {
   send<void>(group, "setIsAccessibilityElement:", true);
-  send<void>(group, "setAccessibilityLabel:", string("group"));
+  setLabel(group, "group");
   EXPECT_EQ(text(false, true), "button, plain, group");
-  send<void>(root, "setAccessibilityElements:", arrayWithObjects({group, plainText}));
+  setElements(root, {group, plainText});
   EXPECT_EQ(text(true, true), "group, plain");
-  send<void>(root, "setAccessibilityElements:", arrayWithObjects({}));
+  setElements(root, {});
   EXPECT_EQ(text(true, true), "(nil)");
 }
 

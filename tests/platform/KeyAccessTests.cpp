@@ -5,6 +5,7 @@
 #include "platform/foundation/NSValue.h"
 #include "platform/uikit/UIControls.h"
 #include "tests/platform/RuntimeTesting.h"
+#include "tests/support/Elements.h"
 
 namespace tavro {
 namespace {
@@ -45,10 +46,6 @@ class Holder : public NSObject {
   Name selector = "frame";
   std::function<void()> block = [] {};
 
-  template <auto Member>
-  auto get() {
-    return this->*Member;
-  }
   id raise() { tavro::raise("TestException", "on purpose"); }
   id throwStandard() { throw std::out_of_range("on purpose"); }
   id throwInteger() { throw 42; }
@@ -72,17 +69,6 @@ const Registered holderClass = defineClass<Holder, NSObject>()
                                    .variable<&Holder::bare>("_raising")
                                    .variable<&Holder::bare>("_standard")
                                    .variable<&Holder::bare>("_integer")
-                                   .method<&Holder::get<&Holder::flag>>("flagAccessor")
-                                   .method<&Holder::get<&Holder::count>>("countAccessor")
-                                   .method<&Holder::get<&Holder::size>>("sizeAccessor")
-                                   .method<&Holder::get<&Holder::narrow>>("narrowAccessor")
-                                   .method<&Holder::get<&Holder::ratio>>("ratioAccessor")
-                                   .method<&Holder::get<&Holder::share>>("shareAccessor")
-                                   .method<&Holder::get<&Holder::point>>("pointAccessor")
-                                   .method<&Holder::get<&Holder::extent>>("extentAccessor")
-                                   .method<&Holder::get<&Holder::frame>>("frameAccessor")
-                                   .method<&Holder::get<&Holder::kind>>("kindAccessor")
-                                   .method<&Holder::get<&Holder::selector>>("selectorAccessor")
                                    .method<&Holder::raise>("raising")
                                    .method<&Holder::throwStandard>("standard")
                                    .method<&Holder::throwInteger>("integer");
@@ -92,6 +78,12 @@ class KeyAccessTests : public ::testing::Test {
   /// A class below Holder with these accessors of its own.
   static id holderWith(std::string_view name, std::vector<Method> accessors) {
     return newOf(testing::madeClass(name, std::move(accessors), Holder::className));
+  }
+
+  /// Lets an accessor answer with the variable's value, and empties the variable.
+  template <class T>
+  void moveToAccessor(Name key, T Holder::*member) {
+    answers<T>(holder, key, [value = std::exchange((*holder).*member, T())] { return value; });
   }
 
   Ref<Holder> holder = make<Holder>();
@@ -132,10 +124,8 @@ TEST_F(KeyAccessTests, WhatIsKnownOfAClassFollowsItsChanges) {
 }
 
 TEST_F(KeyAccessTests, PrimitivesArriveBoxedFromVariablesAndAccessors) {
-  for (const bool byAccessor : {false, true}) {
-    const auto boxed = [&](const std::string& key) {
-      return safeValueForKey(holder, Name::make(key + (byAccessor ? "Accessor" : "")));
-    };
+  const auto expectBoxes = [&] {
+    const auto boxed = [&](Name key) { return safeValueForKey(holder, key); };
     EXPECT_EQ(as<NSNumber>(boxed("flag"))->number.index(), 0U) << "a boolean stays one";
     EXPECT_TRUE(send<bool>(boxed("flag"), "boolValue"));
     EXPECT_EQ(send<std::int64_t>(boxed("count"), "longLongValue"), -5);
@@ -148,8 +138,21 @@ TEST_F(KeyAccessTests, PrimitivesArriveBoxedFromVariablesAndAccessors) {
     EXPECT_EQ(send<CGRect>(boxed("frame"), "CGRectValue"), CGRect(1, 2, 3, 4));
     EXPECT_EQ(boxed("kind"), id(classOf<NSString>()));
     EXPECT_FALSE(boxed("selector")) << "a selector has no box";
-  }
+  };
+  expectBoxes();
   EXPECT_FALSE(safeValueForKey(holder, "block")) << "a block is no object";
+  moveToAccessor("flag", &Holder::flag);
+  moveToAccessor("count", &Holder::count);
+  moveToAccessor("size", &Holder::size);
+  moveToAccessor("narrow", &Holder::narrow);
+  moveToAccessor("ratio", &Holder::ratio);
+  moveToAccessor("share", &Holder::share);
+  moveToAccessor("point", &Holder::point);
+  moveToAccessor("extent", &Holder::extent);
+  moveToAccessor("frame", &Holder::frame);
+  moveToAccessor("kind", &Holder::kind);
+  moveToAccessor("selector", &Holder::selector);
+  expectBoxes();
 }
 
 TEST_F(KeyAccessTests, TypedCallsGiveTheEmptyResultForAnythingElse) {
@@ -213,7 +216,7 @@ TEST_F(KeyAccessTests, ClassObjectsAnswerThroughClassMethodsAlone) {
   EXPECT_TRUE(as<Holder>(shared));
   EXPECT_EQ(safeValueForKey(testing::madeClass("KeySharing", {}, "KeyTestHolder"), "sharedHolder"),
             shared);
-  for (const Name key : {Name("key"), Name("count"), Name("countAccessor"), Name("description"),
+  for (const Name key : {Name("key"), Name("count"), Name("description"),
                          Name("accessibilityLabel"), Name("noSuchKey")}) {
     EXPECT_FALSE(safeValueForKey(isa, key)) << key.text();
     EXPECT_FALSE(safeValueForKey(AXSafeClassFromString("NoSuchClass"), key)) << key.text();
@@ -239,10 +242,7 @@ TEST_F(KeyAccessTests, KeyPathsFollowTheirKeys) {
   const auto label = makeLabel("deep");
   outer->addSubview(inner);
   inner->addSubview(label);
-  const struct {
-    const char* path;
-    const char* found;
-  } cases[] = {
+  const std::pair<const char*, const char*> cases[] = {
       {"text", "deep"},
       {"superview.subviews.firstObject.text", "deep"},
       {"superview.superview", "UIView"},
@@ -251,11 +251,10 @@ TEST_F(KeyAccessTests, KeyPathsFollowTheirKeys) {
       {"hidden", "0"},
       {"superview..text", "(nil)"},
       {".text", "(nil)"},
-      {"noSuchKey.text", "(nil)"},
-  };
-  for (const auto& each : cases) {
-    const id found = safeValueForKeyPath(label.get(), each.path);
-    EXPECT_EQ(found ? utf8(send<id>(found, "description")) : "(nil)", each.found) << each.path;
+      {"noSuchKey.text", "(nil)"}};
+  for (const auto& [path, expected] : cases) {
+    const id found = safeValueForKeyPath(label.get(), path);
+    EXPECT_EQ(found ? utf8(send<id>(found, "description")) : "(nil)", expected) << path;
   }
   EXPECT_FALSE(safeValueForKeyPath(nullptr, "text"));
 }

@@ -1,4 +1,5 @@
 #include <limits>
+#include <tuple>
 
 #include "platform/foundation/NSArray.h"
 #include "platform/foundation/NSValue.h"
@@ -15,150 +16,107 @@ using testing::raisedBy;
 enum class Color : std::int64_t { red = 1, green = 2 };
 using Filter = std::function<bool(id)>;
 
-/// Takes and yields one of everything that can travel.
+template <class T>
+T echo(Object* /*self*/, T value) {
+  return value;
+}
+template <class T>
+T yield(Object* /*self*/) {
+  return T();
+}
+template <class T>
+void take(Object* /*self*/, T /*value*/) {}
+std::int32_t narrow(Object* /*self*/) { return -8; }
+bool isView(Object* /*self*/, UIView* view) { return view != nullptr; }
+bool asks(Object* self, const Filter& filter) { return filter(self); }
+id firstIf(Object* /*self*/, const id& first, std::int64_t second) {
+  return second > 0 ? first : id();
+}
+bool fill(Object* /*self*/, id* out) {
+  if (out != nullptr) {
+    *out = string("filled");
+  }
+  return out != nullptr;
+}
+
+/// Has a method of every kind that can be called.
 class Traveller : public NSObject {
  public:
   static constexpr Name className = "MessageTestTraveller";
-
-  std::string seen;
-
-  std::int64_t integer() { return -7; }
-  std::uint64_t unsignedInteger() { return std::numeric_limits<std::uint64_t>::max(); }
-  std::int32_t narrow() { return -8; }
-  bool flag() { return true; }
-  double real() { return 0.1; }
-  float single() { return 0.25F; }
-  id object() { return this; }
-  Class* kind() { return isa(); }
-  Name selector() { return "real"; }
-  CGPoint point() { return {1, 2}; }
-  CGSize size() { return {3, 4}; }
-  CGRect rect() { return {1, 2, 3, 4}; }
-  Color color() { return Color::green; }
-  void nothing() { seen = "nothing"; }
-
-  void takeInteger(std::int64_t value) { seen = std::to_string(value); }
-  void takeUnsigned(std::uint64_t value) { seen = std::to_string(value); }
-  void takeReal(double value) { seen = std::to_string(value); }
-  void takeSingle(float value) { seen = std::to_string(value); }
-  void takeFlag(bool value) { seen = value ? "YES" : "NO"; }
-  void takeColor(Color value) { seen = std::to_string(static_cast<int>(value)); }
-  void takeString(const Ref<NSString>& value) { seen = value ? utf8(value) : "nil"; }
-  void takeView(UIView* value) { seen = value == nullptr ? "nil" : "view"; }
-  void takeClass(Class* value) { seen = value == nullptr ? "nil" : value->name().text(); }
-  void takeSelector(Name value) { seen = value.text(); }
-  void takeRect(CGRect value) { seen = std::to_string(value.size.height); }
-  void takeBlock(const Filter& value) { seen = value(this) ? "passed" : "failed"; }
-  id takeTwo(const id& first, std::int64_t second) { return second > 0 ? first : id(); }
-  bool fill(id* out) {
-    if (out != nullptr) {
-      *out = string("filled");
-    }
-    return out != nullptr;
-  }
 };
-
 const Registered travellerClass = defineClass<Traveller, NSObject>()
-                                      .method<&Traveller::integer>("integer")
-                                      .method<&Traveller::unsignedInteger>("unsignedInteger")
-                                      .method<&Traveller::narrow>("narrow")
-                                      .method<&Traveller::flag>("flag")
-                                      .method<&Traveller::real>("real")
-                                      .method<&Traveller::single>("single")
-                                      .method<&Traveller::object>("object")
-                                      .method<&Traveller::kind>("kind")
-                                      .method<&Traveller::selector>("selector")
-                                      .method<&Traveller::point>("point")
-                                      .method<&Traveller::size>("size")
-                                      .method<&Traveller::rect>("rect")
-                                      .method<&Traveller::color>("color")
-                                      .method<&Traveller::nothing>("nothing")
-                                      .method<&Traveller::takeInteger>("takeInteger:")
-                                      .method<&Traveller::takeUnsigned>("takeUnsigned:")
-                                      .method<&Traveller::takeReal>("takeReal:")
-                                      .method<&Traveller::takeSingle>("takeSingle:")
-                                      .method<&Traveller::takeFlag>("takeFlag:")
-                                      .method<&Traveller::takeColor>("takeColor:")
-                                      .method<&Traveller::takeString>("takeString:")
-                                      .method<&Traveller::takeView>("takeView:")
-                                      .method<&Traveller::takeClass>("takeClass:")
-                                      .method<&Traveller::takeSelector>("takeSelector:")
-                                      .method<&Traveller::takeRect>("takeRect:")
-                                      .method<&Traveller::takeBlock>("takeBlock:")
-                                      .method<&Traveller::takeTwo>("take:two:")
-                                      .method<&Traveller::fill>("fill:");
+                                      .method<&yield<std::int64_t>>("integer")
+                                      .method<&narrow>("narrow")
+                                      .method<&yield<float>>("single")
+                                      .method<&yield<id>>("object")
+                                      .method<&yield<CGSize>>("size")
+                                      .method<&yield<Class*>>("kind")
+                                      .method<&take<std::int64_t>>("takeInteger:")
+                                      .method<&take<std::uint64_t>>("takeUnsigned:")
+                                      .method<&take<bool>>("takeFlag:")
+                                      .method<&take<double>>("takeReal:")
+                                      .method<&take<float>>("takeSingle:")
+                                      .method<&take<Class*>>("takeClass:")
+                                      .method<&take<Name>>("takeSelector:")
+                                      .method<&take<CGRect>>("takeRect:")
+                                      .method<&take<Ref<NSString>>>("takeString:")
+                                      .method<&isView>("takeView:")
+                                      .method<&asks>("takeBlock:")
+                                      .method<&firstIf>("take:two:")
+                                      .method<&fill>("fill:");
 
 class MessageTests : public ::testing::Test {
  protected:
-  template <class R>
-  void expectResult(Name selector, const R& expected) {
-    EXPECT_EQ(send<R>(traveller, selector), expected) << selector.text();
-    EXPECT_EQ(send<R>(id(), selector), R()) << selector.text();
-    EXPECT_EQ(send<R>(static_cast<Object*>(nullptr), selector), R()) << selector.text();
-    EXPECT_EQ(trySend<R>(traveller, "noSuchSelector"), R()) << selector.text();
-  }
-
-  /// What the traveller saw of one argument.
-  template <class A>
-  std::string seen(Name selector, const A& argument) {
-    traveller->seen = "(not reached)";
-    send<void>(traveller, selector, argument);
-    return traveller->seen;
+  /// A value of that type arrives as an argument and comes back as a result; nil yields zero.
+  template <class T, class Sent = T>
+  void expectTravels(const Sent& sent) {
+    Class* const isa = testing::madeClass("MessageTestEcho" + std::to_string(++count_),
+                                          {methodOf<&echo<T>>("echo:")});
+    const id echoing = newOf(isa);
+    EXPECT_EQ(send<T>(echoing, "echo:", sent), T(sent)) << count_;
+    EXPECT_EQ(send<T>(id(), "echo:", sent), T()) << count_;
+    EXPECT_EQ(send<T>(static_cast<Object*>(nullptr), "echo:", sent), T()) << count_;
+    EXPECT_EQ(trySend<T>(echoing, "noSuchSelector"), T()) << count_;
   }
 
   Ref<Traveller> traveller = make<Traveller>();
+
+ private:
+  int count_ = 0;
 };
 
-TEST_F(MessageTests, EveryResultArrivesAndNilYieldsZero) {
-  expectResult<std::int64_t>("integer", -7);
-  expectResult<std::uint64_t>("unsignedInteger", std::numeric_limits<std::uint64_t>::max());
-  expectResult<std::int32_t>("narrow", -8);
-  expectResult<bool>("flag", true);
-  expectResult<double>("real", 0.1);
-  expectResult<float>("single", 0.25F);
-  expectResult<id>("object", traveller);
-  expectResult<CGPoint>("point", {1, 2});
-  expectResult<CGSize>("size", {3, 4});
-  expectResult<CGRect>("rect", {1, 2, 3, 4});
-  expectResult<Name>("selector", "real");
-  expectResult<Color>("color", Color::green);
-  EXPECT_EQ(send<Class*>(traveller, "kind"), classOf<Traveller>());
-  EXPECT_EQ(send<Class*>(id(), "kind"), nullptr);
-  send<void>(traveller, "nothing");
-  EXPECT_EQ(traveller->seen, "nothing");
-  EXPECT_NO_THROW(send<void>(id(), "nothing"));
-}
-
-TEST_F(MessageTests, EveryArgumentArrives) {
-  EXPECT_EQ(seen("takeInteger:", 3), "3");
-  EXPECT_EQ(seen("takeInteger:", short{-3}), "-3");
-  EXPECT_EQ(seen("takeInteger:", std::numeric_limits<long long>::min()), "-9223372036854775808");
-  EXPECT_EQ(seen("takeInteger:", Color::red), "1");
-  EXPECT_EQ(seen("takeUnsigned:", 3U), "3");
-  EXPECT_EQ(seen("takeUnsigned:", std::size_t{4}), "4");
-  EXPECT_EQ(seen("takeReal:", 0.5), "0.500000");
-  EXPECT_EQ(seen("takeSingle:", 0.5F), "0.500000");
-  EXPECT_EQ(seen("takeFlag:", true), "YES");
-  EXPECT_EQ(seen("takeColor:", 2), "2");
-  EXPECT_EQ(seen("takeString:", string("a")), "a");
-  EXPECT_EQ(seen("takeString:", id(string("b"))), "b");
-  EXPECT_EQ(seen("takeString:", nullptr), "nil");
-  EXPECT_EQ(seen("takeView:", makeView<UIView>()), "view");
-  EXPECT_EQ(seen("takeView:", id()), "nil");
-  EXPECT_EQ(seen("takeClass:", classOf<UIView>()), "UIView");
-  EXPECT_EQ(seen("takeSelector:", Name("frame")), "frame");
-  EXPECT_EQ(seen("takeRect:", CGRect(1, 2, 3, 4)), "4.000000");
-  EXPECT_EQ(seen("takeBlock:", Filter([this](const id& object) { return object == traveller; })),
-            "passed");
+TEST_F(MessageTests, EveryKindOfValueTravels) {
+  expectTravels<std::int64_t>(3);
+  expectTravels<std::int64_t>(short{-3});
+  expectTravels<std::int64_t>(std::numeric_limits<long long>::min());
+  expectTravels<std::int64_t>(Color::red);
+  expectTravels<Color>(Color::green);
+  expectTravels<Color>(2);
+  expectTravels<std::uint64_t>(3U);
+  expectTravels<std::uint64_t>(std::numeric_limits<std::size_t>::max());
+  EXPECT_EQ(send<std::int32_t>(traveller, "narrow"), -8);
+  expectTravels<bool>(true);
+  expectTravels<double>(0.1);
+  expectTravels<float>(0.25F);
+  expectTravels<id>(string("a"));
+  expectTravels<id>(nullptr);
+  expectTravels<Class*>(classOf<UIView>());
+  expectTravels<Name>(Name("frame"));
+  expectTravels<CGPoint>(CGPoint{1, 2});
+  expectTravels<CGSize>(CGSize{3, 4});
+  expectTravels<CGRect>(CGRect(1, 2, 3, 4));
+  EXPECT_NO_THROW(send<void>(traveller, "takeString:", id(string("typed"))));
+  EXPECT_NO_THROW(send<void>(traveller, "takeString:", nullptr));
+  EXPECT_NO_THROW(send<void>(id(), "takeString:", string("nobody")));
+  EXPECT_FALSE(send<bool>(traveller, "takeView:", id()));
+  EXPECT_TRUE(send<bool>(traveller, "takeView:", makeView<UIWindow>())) << "a subclass";
+  EXPECT_TRUE(send<bool>(
+      traveller, "takeBlock:", Filter([this](const id& object) { return object == traveller; })));
 }
 
 TEST_F(MessageTests, WrongCallsRaise) {
   const id text = string("text");
-  const struct {
-    const char* what;
-    std::function<void()> call;
-    const char* reason;
-  } cases[] = {
+  const std::tuple<const char*, std::function<void()>, const char*> cases[] = {
       {"unknown selector", [&] { send<id>(traveller, "walk"); },
        "-[MessageTestTraveller walk]: unrecognized selector"},
       {"unknown class method", [&] { send<id>(classOf<Traveller>(), "integer"); },
@@ -168,19 +126,13 @@ TEST_F(MessageTests, WrongCallsRaise) {
        "-[MessageTestTraveller integer]: has the signature q and was called as @"},
       {"result: double for float", [&] { send<double>(traveller, "single"); }, "f"},
       {"result: 32 bits for 64", [&] { send<std::int32_t>(traveller, "integer"); }, "q"},
-      {"result: 64 bits for 32", [&] { send<std::int64_t>(traveller, "narrow"); }, "i"},
       {"result: nothing for object", [&] { send<void>(traveller, "object"); }, "@"},
       {"result: point for size", [&] { send<CGPoint>(traveller, "size"); }, "CGSize"},
-      {"result: object for class", [&] { send<id>(traveller, "kind"); }, "#"},
       {"unsigned literal", [&] { send<void>(traveller, "takeInteger:", 3U); }, "v,Q"},
-      {"signed literal", [&] { send<void>(traveller, "takeUnsigned:", 3); }, "v,q"},
       {"boolean for integer", [&] { send<void>(traveller, "takeInteger:", true); }, "v,B"},
-      {"integer for boolean", [&] { send<void>(traveller, "takeFlag:", 1); }, "v,q"},
       {"float for double", [&] { send<void>(traveller, "takeReal:", 1.0F); }, "v,f"},
-      {"double for float", [&] { send<void>(traveller, "takeSingle:", 1.0); }, "v,d"},
       {"integer for double", [&] { send<void>(traveller, "takeReal:", 1); }, "v,q"},
       {"object for class", [&] { send<void>(traveller, "takeClass:", text); }, "v,@"},
-      {"object for selector", [&] { send<void>(traveller, "takeSelector:", text); }, "v,@"},
       {"point for rectangle", [&] { send<void>(traveller, "takeRect:", CGPoint()); }, "CGPoint"},
       {"another block", [&] { send<void>(traveller, "takeBlock:", std::function<void(id)>()); },
        "@?<v,@>"},
@@ -190,19 +142,15 @@ TEST_F(MessageTests, WrongCallsRaise) {
       {"object for out-parameter", [&] { send<bool>(traveller, "fill:", text); }, "B,@"},
       {"another class", [&] { send<void>(traveller, "takeString:", number(1.0)); },
        "an object of class NSNumber stands where NSString is needed"},
-      {"another class by pointer", [&] { send<void>(traveller, "takeView:", text); }, "UIView"},
+      {"another class by pointer", [&] { send<bool>(traveller, "takeView:", text); }, "UIView"},
       {"a class object", [&] { send<void>(traveller, "takeString:", id(classOf<NSString>())); },
        "NSString"},
   };
-  for (const auto& each : cases) {
-    const std::string raised = raisedBy(each.call);
-    EXPECT_TRUE(holds(raised, "NSInvalidArgumentException: ")) << each.what;
-    EXPECT_TRUE(holds(raised, each.reason)) << each.what;
+  for (const auto& [what, call, reason] : cases) {
+    const std::string raised = raisedBy(call);
+    EXPECT_TRUE(holds(raised, "NSInvalidArgumentException: ")) << what;
+    EXPECT_TRUE(holds(raised, reason)) << what;
   }
-}
-
-TEST_F(MessageTests, SubclassesPassWhereTheirSuperclassIsTaken) {
-  EXPECT_EQ(seen("takeView:", makeView<UIWindow>()), "view");
 }
 
 TEST_F(MessageTests, OutParametersAreFilledUnlessNull) {
@@ -215,7 +163,7 @@ TEST_F(MessageTests, OutParametersAreFilledUnlessNull) {
 
 TEST_F(MessageTests, SelectorsMayBeMadeAtRunTime) {
   const std::string half = "inte";
-  EXPECT_EQ(send<std::int64_t>(traveller, Name::make(half + "ger")), -7);
+  EXPECT_EQ(send<std::int64_t>(traveller, Name::make(half + "ger")), 0);
   EXPECT_EQ(Name::make(half + "ger"), Name("integer"));
   EXPECT_EQ(Name::make(""), Name());
   EXPECT_EQ(Name::make(half).text(), half);
@@ -253,6 +201,7 @@ const Registered needyClass = defineClass<Needy, NSObject>().method<&Needy::need
 TEST_F(MessageTests, WhatCannotBeMadeIsNil) {
   EXPECT_FALSE(send<id>(classOf<Needy>(), "alloc"));
   EXPECT_FALSE(make<Needy>());
+  EXPECT_EQ(classOf<Needy>()->isa()->allocate(), nullptr) << "a metaclass";
   EXPECT_EQ(send<std::int64_t>(newOf(classOf<Needy>()), "need"), 0);
 }
 

@@ -21,18 +21,6 @@ Method answer() {
 }
 std::string ask(const id& object) { return utf8(send<id>(object, "answer")); }
 
-TEST(ClassTests, MessagesReachTheNearestImplementation) {
-  Class* const base = madeClass("NearestBase", {answer<'b'>()});
-  Class* const middle = madeClass("NearestMiddle", {}, "NearestBase");
-  Class* const lower = madeClass("NearestLower", {answer<'l'>()}, "NearestMiddle");
-  Class* const last = madeClass("NearestLast", {}, "NearestLower");
-  EXPECT_EQ(ask(newOf(base)) + ask(newOf(middle)) + ask(newOf(lower)) + ask(newOf(last)), "bbll");
-  middle->setMethod(answer<'m'>());
-  EXPECT_EQ(ask(newOf(base)) + ask(newOf(middle)) + ask(newOf(lower)) + ask(newOf(last)), "bmll");
-  lower->removeMethod("answer");
-  EXPECT_EQ(ask(newOf(base)) + ask(newOf(middle)) + ask(newOf(lower)) + ask(newOf(last)), "bmmm");
-}
-
 TEST(ClassTests, AReplacedMethodIsReachedWhoeverWasMessagedBefore) {
   enum Messaged { base = 1, inheriting = 2, overriding = 4, unrelated = 8, all = 16 };
   for (int messaged = 0; messaged < all; ++messaged) {
@@ -72,7 +60,6 @@ TEST(ClassTests, ARemovedMethodIsGoneUntilItIsSetAgain) {
   isa->setMethod(answer<'b'>());
   isa->removeMethod("answer");
   EXPECT_TRUE(holds(raisedBy([&] { ask(newOf(isa)); }), "unrecognized selector"));
-  EXPECT_TRUE(isa->ownMethods().empty());
   isa->removeMethod("answer");  // once more changes nothing
   const Method* const set = isa->setMethod(answer<'c'>());
   EXPECT_EQ(set->replaced, nullptr) << "what was taken away is not what was replaced";

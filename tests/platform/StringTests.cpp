@@ -1,4 +1,5 @@
 #include <limits>
+#include <tuple>
 
 #include "platform/foundation/NSAttributedString.h"
 #include "platform/foundation/NSValue.h"
@@ -13,14 +14,12 @@ using testing::heard;
 class StringTest : public FoundationTest {};
 
 TEST_F(StringTest, TextsSurviveBothEncodings) {
-  const struct {
-    std::string_view utf8;
-    std::size_t length;
-  } cases[] = {{"", 0}, {"a", 1}, {"é", 1}, {"–", 1}, {"😀", 2}, {"مرحبا", 5}};
-  for (const auto& each : cases) {
-    const Ref<NSString> text = string(each.utf8);
-    EXPECT_EQ(text->length(), each.length) << each.utf8;
-    EXPECT_EQ(text->utf8(), each.utf8);
+  const std::pair<std::string_view, std::size_t> cases[] = {{"", 0},  {"a", 1}, {"é", 1},
+                                                            {"–", 1}, {"😀", 2}, {"مرحبا", 5}};
+  for (const auto& [utf8, length] : cases) {
+    const Ref<NSString> text = string(utf8);
+    EXPECT_EQ(text->length(), length) << utf8;
+    EXPECT_EQ(text->utf8(), utf8);
   }
 }
 
@@ -65,61 +64,46 @@ TEST_F(StringTest, SearchAndReplacementGoUnitByUnit) {
   EXPECT_TRUE(containsString(*string("a––b"), u"––"));
   EXPECT_FALSE(containsString(*string("a–b"), u"––"));
   EXPECT_FALSE(containsString(*string("a"), u""));
-  const struct {
-    std::string_view text;
-    std::u16string_view part;
-    std::u16string_view replacement;
-    std::string_view expected;
-  } cases[] = {
-      {"aXbXXc", u"X", u"", "abc"},     {"aaa", u"aa", u"b", "ba"}, {"aa", u"a", u"aa", "aaaa"},
-      {"abc", u"", u"x", "abc"},        {"abc", u"z", u"x", "abc"}, {"", u"a", u"x", ""},
-      {"8'05\"", u"'", u"–", "8–05\""},
-  };
-  for (const auto& each : cases) {
-    EXPECT_EQ(stringByReplacing(*string(each.text), each.part, each.replacement)->utf8(),
-              each.expected)
-        << each.text;
+  const std::tuple<std::string_view, std::u16string_view, std::u16string_view, std::string_view>
+      cases[] = {
+          {"aXbXXc", u"X", u"", "abc"},     {"aaa", u"aa", u"b", "ba"}, {"aa", u"a", u"aa", "aaaa"},
+          {"abc", u"", u"x", "abc"},        {"abc", u"z", u"x", "abc"}, {"", u"a", u"x", ""},
+          {"8'05\"", u"'", u"–", "8–05\""},
+      };
+  for (const auto& [text, part, replacement, expected] : cases) {
+    EXPECT_EQ(stringByReplacing(*string(text), part, replacement)->utf8(), expected) << text;
   }
 }
 
-struct FormatCase {
-  std::string_view format;
-  std::string_view expected;
-};
-
-/// With the arguments "left", 1234567, "right".
-class FormatTest : public FoundationTest, public ::testing::WithParamInterface<FormatCase> {};
-
-TEST_P(FormatTest, Fills) {
-  const Ref<NSString> filled = stringWithFormat(
-      string(GetParam().format), {string("left"), std::int64_t{1234567}, string("right")});
-  EXPECT_EQ(heard(filled), GetParam().expected) << GetParam().format;
+TEST_F(StringTest, FormatsAreFilledHoweverTheyAreTranslated) {
+  const std::pair<std::string_view, std::string_view> cases[] = {
+      {"%@ %d %@", "left 1234567 right"},
+      {"%@ %lld", "left 1234567"},
+      {"%3$@ %2$d %1$@", "right 1234567 left"},
+      {"%1$@%1$@", "leftleft"},
+      {"%2$lld", "1234567"},
+      {"%3$@ %@", "right left"},
+      {"%%@ 100%%", "%@ 100%"},
+      {"", ""},
+      // Faulty translations.
+      {"%d|%@|%@", "||right"},
+      {"%@ %d %@ %@ %d", "left 1234567 right  "},
+      {"%4$@|%0$@|%99999999999999999999$@", "||"},
+      {"50% of %@", "50% of left"},
+      {"%@ 100%", "left 100%"},
+      {"%s %ld %5 %$@ %1$", "%s %ld %5 %$@ %1$"},
+      {"%1@", "%1@"}};
+  for (const auto& [format, expected] : cases) {
+    EXPECT_EQ(heard(stringWithFormat(string(format),
+                                     {string("left"), std::int64_t{1234567}, string("right")})),
+              expected)
+        << format;
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(Placeholders, FormatTest,
-                         ::testing::Values(FormatCase{"%@ %d %@", "left 1234567 right"},
-                                           FormatCase{"%@ %lld", "left 1234567"},
-                                           FormatCase{"%3$@ %2$d %1$@", "right 1234567 left"},
-                                           FormatCase{"%1$@%1$@", "leftleft"},
-                                           FormatCase{"%2$lld", "1234567"},
-                                           FormatCase{"%3$@ %@", "right left"},
-                                           FormatCase{"%%@ 100%%", "%@ 100%"}, FormatCase{"", ""}));
-
-INSTANTIATE_TEST_SUITE_P(FaultyTranslations, FormatTest,
-                         ::testing::Values(FormatCase{"%d|%@|%@", "||right"},
-                                           FormatCase{"%@ %d %@ %@ %d", "left 1234567 right  "},
-                                           FormatCase{"%4$@|%0$@|%99999999999999999999$@", "||"},
-                                           FormatCase{"50% of %@", "50% of left"},
-                                           FormatCase{"%@ 100%", "left 100%"},
-                                           FormatCase{"%s %ld %5 %$@ %1$", "%s %ld %5 %$@ %1$"},
-                                           FormatCase{"%1@", "%1@"}));
 
 TEST_F(StringTest, TheWholeNumberThatATextBeginsWith) {
   using Limits = std::numeric_limits<std::int64_t>;
-  const struct {
-    std::string text;
-    std::int64_t number;
-  } cases[] = {
+  const std::pair<std::string, std::int64_t> cases[] = {
       {"", 0},
       {"12", 12},
       {" \u00a0-12.9 kg", -12},
@@ -136,10 +120,9 @@ TEST_F(StringTest, TheWholeNumberThatATextBeginsWith) {
       {std::string(100'000, '9'), Limits::max()},
       {"-" + std::string(100'000, '9'), Limits::min()},
       {std::string(100'000, '0') + "8", 8},
-      {"-", 0},
-  };
-  for (const auto& each : cases) {
-    EXPECT_EQ(integerValue(*string(each.text)), each.number) << each.text.substr(0, 30);
+      {"-", 0}};
+  for (const auto& [text, number] : cases) {
+    EXPECT_EQ(integerValue(*string(text)), number) << text.substr(0, 30);
   }
 }
 
@@ -157,48 +140,33 @@ TEST_F(StringTest, NothingIsFormattedWithNil) {
 }
 
 TEST_F(StringTest, OnlyLocalizedFormatsUseTheDigitsOfTheUser) {
-  const struct {
-    std::string locale;
-    std::string_view localized;
-  } cases[] = {{"en_US", "1,234,567"}, {"de_DE", "1.234.567"}, {"ar_EG", "١٬٢٣٤٬٥٦٧"}};
-  for (const auto& each : cases) {
-    settings_.locale = each.locale;
-    EXPECT_EQ(heard(localizedStringWithFormat(string("%d"), {std::int64_t{1234567}})),
-              each.localized);
+  const std::pair<std::string, std::string_view> cases[] = {
+      {"en_US", "1,234,567"}, {"de_DE", "1.234.567"}, {"ar_EG", "١٬٢٣٤٬٥٦٧"}};
+  for (const auto& [locale, localized] : cases) {
+    settings_.locale = locale;
+    EXPECT_EQ(heard(localizedStringWithFormat(string("%d"), {std::int64_t{1234567}})), localized);
     EXPECT_EQ(heard(stringWithFormat(string("%d"), {std::int64_t{1234567}})), "1234567");
   }
   constexpr auto kLowest = std::numeric_limits<std::int64_t>::min();
   EXPECT_EQ(heard(stringWithFormat(string("%lld"), {kLowest})), "-9223372036854775808");
 }
 
-struct PluralCase {
-  std::string language;
-  std::int64_t integer;
-  std::string_view category;
-};
-
-class PluralTest : public FoundationTest, public ::testing::WithParamInterface<PluralCase> {};
-
-TEST_P(PluralTest, ChoosesTheForm) {
-  const Ref<NSPluralFormat> format = make<NSPluralFormat>();
-  format->language = GetParam().language;
-  format->initWithText(u"other");
-  format->forms = {{"zero", u"zero"}, {"one", u"one"},   {"two", u"two"},
-                   {"few", u"few"},   {"many", u"many"}, {"other", u"other"}};
-  EXPECT_EQ(heard(stringWithFormat(format, {GetParam().integer})), GetParam().category)
-      << GetParam().language << GetParam().integer;
+TEST_F(StringTest, ThePluralFormIsTheLanguages) {
+  const std::tuple<const char*, std::int64_t, const char*> cases[] = {
+      {"en", 1, "one"},     {"en", 2, "other"},    {"en", 0, "other"}, {"fr", 0, "one"},
+      {"ja", 1, "other"},   {"pl", 3, "few"},      {"pl", 5, "many"},  {"pl", 12, "many"},
+      {"pl", 22, "few"},    {"ru", 21, "one"},     {"ru", 11, "many"}, {"ar", 0, "zero"},
+      {"ar", 1, "one"},     {"ar", 2, "two"},      {"ar", 3, "few"},   {"ar", 11, "many"},
+      {"ar", 100, "other"}, {"pt_PT", 0, "other"}, {"pt_BR", 0, "one"}};
+  for (const auto& [language, integer, category] : cases) {
+    const Ref<NSPluralFormat> format = make<NSPluralFormat>();
+    format->language = language;
+    format->initWithText(u"other");
+    format->forms = {{"zero", u"zero"}, {"one", u"one"},   {"two", u"two"},
+                     {"few", u"few"},   {"many", u"many"}, {"other", u"other"}};
+    EXPECT_EQ(heard(stringWithFormat(format, {integer})), category) << language << integer;
+  }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Languages, PluralTest,
-    ::testing::Values(
-        PluralCase{"en", 1, "one"}, PluralCase{"en", 2, "other"}, PluralCase{"en", 0, "other"},
-        PluralCase{"fr", 0, "one"}, PluralCase{"ja", 1, "other"}, PluralCase{"pl", 1, "one"},
-        PluralCase{"pl", 3, "few"}, PluralCase{"pl", 5, "many"}, PluralCase{"pl", 12, "many"},
-        PluralCase{"pl", 22, "few"}, PluralCase{"ru", 21, "one"}, PluralCase{"ru", 11, "many"},
-        PluralCase{"ar", 0, "zero"}, PluralCase{"ar", 1, "one"}, PluralCase{"ar", 2, "two"},
-        PluralCase{"ar", 3, "few"}, PluralCase{"ar", 11, "many"}, PluralCase{"ar", 100, "other"},
-        PluralCase{"pt_PT", 0, "other"}, PluralCase{"pt_BR", 0, "one"}));
 
 TEST_F(StringTest, PluralFormatsFollowTheirFirstIntegerAndElseSayOther) {
   const Ref<NSPluralFormat> format = make<NSPluralFormat>();

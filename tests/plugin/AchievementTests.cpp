@@ -7,47 +7,6 @@
 namespace tavro {
 namespace {
 
-using Utterances = std::vector<std::string>;
-
-/// Gives the title that a test wants it to give, or raises.
-class OddProvider : public AAUIAchievementLocalizationProvider {
- public:
-  static constexpr Name className = "OddProvider";
-  id title;
-  bool raises = false;
-
-  id oddTitle(const id& /*achievement*/) {
-    return raises ? throw NSException(kRangeException, "no title") : title;
-  }
-};
-const Registered oddProvider =
-    defineClass<OddProvider, AAUIAchievementLocalizationProvider>().method<&OddProvider::oddTitle>(
-        "titleForAchievement:");
-
-/// A screen without the parts that it should have.
-class OddDetail : public CHAchievementDetailViewController {
- public:
-  static constexpr Name className = "OddDetail";
-  id container;
-  id text;
-
-  id oddContainer() { return container; }
-  id oddText() { return text; }
-};
-const Registered oddDetail = defineClass<OddDetail, CHAchievementDetailViewController>()
-                                 .method<&OddDetail::oddContainer>("badgeContainer")
-                                 .method<&OddDetail::oddText>("label");
-
-class OddCell : public CHAchievementCollectionViewCell {
- public:
-  static constexpr Name className = "OddCell";
-  id shown;
-  id oddAchievement() { return shown; }
-};
-const Registered oddCell =
-    defineClass<OddCell, CHAchievementCollectionViewCell>().method<&OddCell::oddAchievement>(
-        "achievement");
-
 Ref<ACHAchievement> achievementWith(const char* title, const char* progress) {
   auto achievement = make<ACHAchievement>();
   achievement->title = title;
@@ -61,10 +20,6 @@ class AchievementTest : public PluginTest {
     const auto screen = makeController<CHAchievementDetailViewController>();
     screen->setAchievement(achievement, provider);
     return screen;
-  }
-
-  static void load(const id& object) {
-    send<void>(object, "_accessibilityLoadAccessibilityInformation");
   }
 
   Ref<AAUIAchievementLocalizationProvider> provider = make<AAUIAchievementLocalizationProvider>();
@@ -96,21 +51,24 @@ TEST_F(AchievementTest, AnotherAchievementIsHeardAfterTheNextLoad) {
 }
 
 TEST_F(AchievementTest, WithoutATitleTheBadgeIsLeftAloneAndTheTextIsRead) {
-  const auto odd = make<OddProvider>();
-  provider = odd;
+  id title;
+  bool raises = false;
+  answers<id, const id&>(provider, "titleForAchievement:", [&](const id& /*achievement*/) {
+    return raises ? throw NSException(kRangeException, "no title") : title;
+  });
   const auto screen = screenOf(achievementWith("First Run", "Recorded\nonce"));
   for (const id& noTitle : {id(), id(string("")), id(number(7.0)), id(make<NSObject>())}) {
-    odd->title = noTitle;
+    title = noTitle;
     load(screen);
     EXPECT_EQ(heard(screen->view()), Utterances{"Recorded, once"});
   }
-  odd->raises = true;
+  raises = true;
   load(screen);
   EXPECT_EQ(heard(screen->view()), Utterances{"Recorded, once"});
-  odd->raises = false;
-  odd->title = string("T");
+  raises = false;
+  title = string("T");
   load(screen);
-  odd->title = nullptr;
+  title = nullptr;
   load(screen);
   EXPECT_EQ(heard(screen->view()).front(), "T badge") << "it keeps what it was given before";
   screen->_locProvider = nullptr;
@@ -118,27 +76,22 @@ TEST_F(AchievementTest, WithoutATitleTheBadgeIsLeftAloneAndTheTextIsRead) {
 }
 
 TEST_F(AchievementTest, TextIsReadLineByLine) {
-  struct Case {
-    const char* text;
-    const char* label;
-  };
-  const Case cases[] = {
+  const std::pair<const char*, const char*> cases[] = {
       {"one", "one"},
       {"one\ntwo", "one, two"},
       {"one\n\ntwo\n", "one, two"},
       {"one\r\ntwo", "one, two"},
       {"one\u2028two\u2029three\u0085four", "one, two, three, four"},
-      {"one, 1", "one, 1"},
-  };
+      {"one, 1", "one, 1"}};
   const auto screen = screenOf(nullptr);
   send<id>(screen, "view");
   const auto content = makeView<CHAchievementsCellContentView>();
-  for (const Case& each : cases) {
-    as<UILabel>(screen->label())->setText(string(each.text));
+  for (const auto& [text, label] : cases) {
+    as<UILabel>(screen->label())->setText(string(text));
     load(screen);
-    EXPECT_EQ(heard(screen->view()), Utterances{each.label});
-    content->_label->setText(string(each.text));
-    EXPECT_EQ(labelOf(content), each.label);
+    EXPECT_EQ(heard(screen->view()), Utterances{label});
+    content->_label->setText(string(text));
+    EXPECT_EQ(labelOf(content), label);
   }
 }
 
@@ -147,23 +100,22 @@ TEST_F(AchievementTest, ALabelWithoutTextIsLeftAsItIs) {
   send<id>(screen, "view");
   for (const Ref<NSString>& noText : {Ref<NSString>(), string("")}) {
     as<UILabel>(screen->label())->setText(noText);
-    send<void>(screen->label(), "setAccessibilityLabel:", string("kept"));
+    setLabel(screen->label(), "kept");
     load(screen);
     EXPECT_EQ(labelOf(screen->label()), "kept");
   }
 }
 
 TEST_F(AchievementTest, OddPartsOfAScreenDoNotSilenceTheOthers) {
-  const auto screen = makeController<OddDetail>();
-  screen->setAchievement(achievementWith("First Run", ""), provider);
+  const auto screen = screenOf(achievementWith("First Run", ""));
   const auto text = makeLabel("one\ntwo");
   const auto container = makeView<UIView>();
-  screen->container = make<NSObject>();
-  screen->text = text;
+  answers(screen, "badgeContainer", make<NSObject>());
+  answers(screen, "label", text);
   load(screen);
   EXPECT_EQ(labelOf(text), "one, two");
-  screen->container = container;
-  screen->text = make<NSObject>();
+  answers(screen, "badgeContainer", container);
+  answers(screen, "label", make<NSObject>());
   load(screen);
   EXPECT_EQ(heard(container), Utterances{"First Run badge"});
 }
@@ -174,11 +126,10 @@ TEST_F(AchievementTest, ACellSaysItsAchievementsTitle) {
   cell->setAchievement(achievementWith("{name}'s Record", ""), string("shown"));
   show(cell);
   EXPECT_EQ(heard(cell), Utterances{"Robin's Record"});
-  const auto odd = makeView<OddCell>({0, 0, 130, 150});
   for (const id& notAnAchievement : {id(), id(string("First Run")), id(make<NSObject>())}) {
-    odd->shown = notAnAchievement;
-    EXPECT_TRUE(send<bool>(odd, "isAccessibilityElement"));
-    EXPECT_EQ(send<id>(odd, "accessibilityLabel"), id());
+    answers(cell, "achievement", notAnAchievement);
+    EXPECT_TRUE(isElement(cell));
+    EXPECT_EQ(send<id>(cell, "accessibilityLabel"), id());
   }
 }
 
@@ -187,9 +138,8 @@ TEST_F(AchievementTest, ContentIsAButtonWithItsPicturesValue) {
   const auto content = makeView<CHAchievementsCellContentView>({0, 0, 130, 150});
   content->setAchievement(*achievement, string("First\nRun"));
   EXPECT_EQ(heard(content), Utterances{"First, Run, Not earned yet, button"});
-  send<void>(content, "setAccessibilityTraits:", UIAccessibilityTraitSelected);
-  EXPECT_EQ(send<UIAccessibilityTraits>(content, "accessibilityTraits"),
-            UIAccessibilityTraitSelected | UIAccessibilityTraitButton);
+  setTraits(content, UIAccessibilityTraitSelected);
+  EXPECT_EQ(traitsOf(content), UIAccessibilityTraitSelected | UIAccessibilityTraitButton);
 }
 
 TEST_F(AchievementTest, ContentWithoutTextOrPictureFallsBackToItsOwnAnswers) {
@@ -197,11 +147,11 @@ TEST_F(AchievementTest, ContentWithoutTextOrPictureFallsBackToItsOwnAnswers) {
   const auto image = make<UIImage>();
   content->_badgeView->setImage(image);
   EXPECT_EQ(heard(content), Utterances{"button"});
-  send<void>(content, "setAccessibilityLabel:", string("own label"));
-  send<void>(content, "setAccessibilityValue:", string("own value"));
+  setLabel(content, "own label");
+  setValue(content, "own value");
   const Utterances own{"own label, own value, button"};
   EXPECT_EQ(heard(content), own);
-  send<void>(image, "setAccessibilityValue:", string(""));
+  setValue(image, "");
   EXPECT_EQ(heard(content), own) << "an empty value is none";
   send<void>(image, "setAccessibilityValue:", attributedString(string("gold")));
   EXPECT_EQ(heard(content), Utterances{"own label, gold, button"});
@@ -218,10 +168,9 @@ TEST_F(AchievementTest, ASectionIsOneHeading) {
   show(header);
   EXPECT_EQ(heard(header), Utterances{"Move, heading"});
   header->setTitle("Stand");
-  send<void>(header, "setAccessibilityTraits:", UIAccessibilityTraitSelected);
+  setTraits(header, UIAccessibilityTraitSelected);
   EXPECT_EQ(labelOf(header), "Stand");
-  EXPECT_EQ(send<UIAccessibilityTraits>(header, "accessibilityTraits"),
-            UIAccessibilityTraitSelected | UIAccessibilityTraitHeader);
+  EXPECT_EQ(traitsOf(header), UIAccessibilityTraitSelected | UIAccessibilityTraitHeader);
 }
 
 }  // namespace

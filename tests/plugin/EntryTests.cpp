@@ -1,10 +1,10 @@
 #include <cstdint>
 #include <set>
 #include <stdexcept>
+#include <tuple>
 
 #include "host/libraries/Achievements.h"
 #include "platform/accessibility/SafeCategory.h"
-#include "platform/foundation/NSBundle.h"
 #include "platform/healthkit/HKActivitySummary.h"
 #include "platform/healthkit/HKUnit.h"
 #include "tests/support/Plugin.h"
@@ -47,30 +47,14 @@ TEST_F(OpenedBundleTest, EveryCategoryButTwoIsAskedForInOrderUnderTheRunsNames) 
   }
   EXPECT_EQ(left, (std::set<std::string>{"TavDayCellLayerAccessibility", "WeekViewAccessibility"}));
   ASSERT_EQ(report.installations.size(), 53U);
-  const std::pair<std::size_t, const char*> landmarks[] = {
-      {1, "CHListSummaryTableViewCellAccessibility"},
-      {14, "ActivityMoveAndExerciseChartViewAccessibility"},
-      {29, "_CHWorkoutDetailWeatherViewAccessibility"},
-      {41, "TavroUIScrollViewAccessibility"},
-      {51, "AX_TavroNSStringAccessibility"},
-      {53, "CHASActivitySetupViewControllerAccessibility"},
-  };
-  for (const auto& [place, category] : landmarks) {
-    EXPECT_EQ(report.installations[place - 1].category, category) << place;
-  }
+  EXPECT_EQ(report.installations[13].category, "ActivityMoveAndExerciseChartViewAccessibility");
+  EXPECT_EQ(report.installations[52].category, "CHASActivitySetupViewControllerAccessibility");
   EXPECT_EQ(report.targetName, "AX Tavro");
   EXPECT_EQ(manager().processName(), "AX Tavro");
   EXPECT_FALSE(manager().isDebugBuild());
   ASSERT_GE(report.checks.size(), 3U);
-  const char* const first[][2] = {{"NSCalendar", "hk_gregorianCalendarWithUTCTimeZone"},
-                                  {"ActivitySummaryCache", "activitySummaryForCacheIndex:"},
-                                  {"HKActivitySummary", "_exerciseTimeCompletionPercentage"}};
-  for (std::size_t index = 0; index < std::size(first); ++index) {
-    const CheckOutcome& check = report.checks[index];
-    EXPECT_EQ(check.className, first[index][0]);
-    EXPECT_EQ(check.member, first[index][1]);
-    EXPECT_EQ(check.category, "");
-    EXPECT_TRUE(check.passed) << check.reason;
+  for (std::size_t index = 0; index < 3; ++index) {
+    EXPECT_EQ(report.checks[index].category, "") << "the process as a whole comes first";
   }
 }
 
@@ -88,19 +72,6 @@ TEST_F(OpenedBundleTest, ASecondCallNeitherValidatesNorInstalls) {
   EXPECT_EQ(
       Class::named("TavroApp.ActivityMoveAndExerciseChartView")->method("accessibilityElements"),
       grafted);
-}
-
-TEST_F(OpenedBundleTest, SkippedCategoriesAreReportedAndTheOthersInstalled) {
-  forgetClass("DayViewActivityRingsTableViewCellAccessibility");
-  forgetClass("TavroApp.DayViewMoveAndExerciseChartTableViewCell");
-  bundle.initialize();
-  const std::vector<InstallationOutcome>& outcomes = manager().report().installations;
-  ASSERT_EQ(outcomes.size(), 53U);
-  EXPECT_EQ(outcomes[3].reason, "the category's class is not loaded");
-  EXPECT_EQ(outcomes[12].target, "TavroApp.DayViewMoveAndExerciseChartTableViewCell");
-  EXPECT_EQ(outcomes[12].reason, "the target class is not loaded");
-  EXPECT_FALSE(outcomes[3].installed || outcomes[12].installed);
-  EXPECT_TRUE(outcomes[13].installed) << "one that fails does not stop the next";
 }
 
 TEST_F(OpenedBundleTest, ChecksRunOnlyWhenTheRuntimeWantsThem) {
@@ -163,16 +134,14 @@ Function* exported(const LoadedBundle& bundle, const char* name) {
 TEST_F(EntryTest, TrendTypesHaveTheirUnits) {
   auto* const unitOf =
       exported<Ref<HKUnit>(std::int64_t)>(bundle, "accessibilityHKUnitForTrendType");
-  const struct {
-    std::int64_t type;
-    const char* unit;  // null: none
-  } cases[] = {{-1, nullptr}, {0, "kcal"},          {1, "min"},          {2, "count"}, {3, "m"},
-               {4, "count"},  {5, "count"},         {6, "mL/kg·min"},    {7, "km/hr"}, {8, "km/hr"},
-               {9, nullptr},  {INT64_MIN, nullptr}, {INT64_MAX, nullptr}};
-  for (const auto& each : cases) {
-    const Ref<HKUnit> unit = unitOf(each.type);
-    EXPECT_EQ(unit ? utf8(unit->unitString()) : "(nil)", each.unit == nullptr ? "(nil)" : each.unit)
-        << each.type;
+  const std::pair<std::int64_t, const char*> cases[] = {
+      {-1, nullptr}, {0, "kcal"},          {1, "min"},          {2, "count"}, {3, "m"},
+      {4, "count"},  {5, "count"},         {6, "mL/kg·min"},    {7, "km/hr"}, {8, "km/hr"},
+      {9, nullptr},  {INT64_MIN, nullptr}, {INT64_MAX, nullptr}};
+  for (const auto& [type, expected] : cases) {
+    const Ref<HKUnit> unit = unitOf(type);
+    EXPECT_EQ(unit ? utf8(unit->unitString()) : "(nil)", expected == nullptr ? "(nil)" : expected)
+        << type;
   }
 }
 
@@ -180,35 +149,24 @@ TEST_F(EntryTest, TheCacheIndexIsTheDayOfTheGregorianCalendar) {
   auto* const indexOf = exported<std::int64_t(const Ref<NSDate>&)>(bundle, "CHCacheIndexForDate");
   Settings& settings = Settings::current();
   const std::int64_t first = indexOf(dateWithSeconds(0));
-  const struct {
-    const char* calendar;
-    const char* locale;
-    const char* timeZone;
-    double seconds;
-    std::int64_t days;  // after the first of January 1970
-  } cases[] = {
-      {"", "en_US", "UTC", 86399, 0},
-      {"", "en_US", "UTC", 86400, 1},
-      {"", "en_US", "UTC", -1, -1},
-      {"hebrew", "en_US", "UTC", 1773242400, 20523},
-      {"islamic", "en_US", "UTC", 1773242400, 20523},
-      {"buddhist", "en_US", "UTC", 1773242400, 20523},
-      {"", "fa_IR", "UTC", 1773242400, 20523},
-      {"", "en_US", "Pacific/Kiritimati", 1773223200, 20524},
-      {"", "en_US", "Pacific/Kiritimati", 1773223199, 20523},
-      {"", "en_US", "America/New_York", 18000, 0},
-      {"", "en_US", "America/New_York", 17999, -1},
+  const std::tuple<const char*, const char*, double, std::int64_t> cases[] = {
+      // Days after the first of January 1970.
+      {"", "UTC", 86399, 0},
+      {"", "UTC", -1, -1},
+      {"hebrew", "UTC", 1773242400, 20523},
+      {"", "Pacific/Kiritimati", 1773223200, 20524},
+      {"", "America/New_York", 18000, 0},
+      {"", "America/New_York", 17999, -1},
   };
-  for (const auto& each : cases) {
-    settings.calendar = each.calendar;
-    settings.locale = each.locale;
-    settings.timeZone = each.timeZone;
-    EXPECT_EQ(indexOf(dateWithSeconds(each.seconds)) - first, each.days)
-        << each.calendar << each.locale << each.timeZone << " " << each.seconds;
+  for (const auto& [calendar, timeZone, seconds, days] : cases) {
+    settings.calendar = calendar;
+    settings.timeZone = timeZone;
+    EXPECT_EQ(indexOf(dateWithSeconds(seconds)) - first, days) << calendar << timeZone << seconds;
   }
   EXPECT_NO_THROW(indexOf(nullptr));
 }
 
+/// A subclass of the host's.
 class SpecialAchievement : public ACHAchievement {
  public:
   static constexpr Name className = "EntryTestSpecialAchievement";
@@ -253,49 +211,14 @@ TEST_F(EntryTest, AnotherObjectMayBeTheFirstToSettleTheUser) {
   EXPECT_EQ(utf8(titleOf(achievement<ACHAchievement>())), " walked");
 }
 
-TEST_F(EntryTest, EveryWordIsInTheTable) {
-  const char* const keys[] = {"today",
-                              "no.data",
-                              "worked.out",
-                              "today.indicator",
-                              "lifestyle.all.goals.completed",
-                              "lifestyle.goal.completed",
-                              "lifestyle.calories.burned",
-                              "lifestyle.active.minutes",
-                              "lifestyle.active.hours",
-                              "lifestyle.active.hours.wheelchair.roll",
-                              "calories.format",
-                              "minutes.format",
-                              "stand.goal.active",
-                              "stand.goal.inactive",
-                              "summary.cell.header.total",
-                              "summary.cell.header.average",
-                              "heart.rate.graph.single",
-                              "heart.rate.graph.range",
-                              "workout.detail.map.hint",
-                              "trends.value.with.unit",
-                              "trends.365.day.average",
-                              "trends.90.day.average",
-                              "sort.by.options",
-                              "competition.in.progress",
-                              "messages",
-                              "messages.hint",
-                              "friend.list",
-                              "badge.format",
-                              "achievement.badge.format"};
+TEST_F(EntryTest, WordsThatAreNotInTheTableAreTheirKeys) {
   auto* const textOf =
       exported<Ref<NSString>(const Ref<NSString>&)>(bundle, "accessibilityLocalizedString");
-  const Ref<NSBundle> resources = NSBundle::bundleWithPath(bundle.path());
-  const StringTable& table = resources->table("Accessibility");
-  EXPECT_EQ(table.size(), std::size(keys)) << "nothing is translated that nobody says";
-  for (const char* const key : keys) {
-    EXPECT_TRUE(table.contains(key)) << key;
-    const std::string text = utf8(textOf(string(key)));
-    EXPECT_NE(text, key);
-    EXPECT_NE(text, "") << key;
+  const std::pair<const char*, const char*> cases[] = {
+      {"no.data", "No data"}, {"no.such.key", "no.such.key"}, {"", ""}};
+  for (const auto& [key, text] : cases) {
+    EXPECT_EQ(utf8(textOf(string(key))), text);
   }
-  EXPECT_EQ(utf8(textOf(string("no.such.key"))), "no.such.key");
-  EXPECT_EQ(utf8(textOf(string(""))), "");
   EXPECT_FALSE(textOf(nullptr));
   forgetClass("AXTavroGlue");
   EXPECT_FALSE(textOf(string("today"))) << "the plug-in's bundle cannot be found";

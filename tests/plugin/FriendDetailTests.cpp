@@ -1,3 +1,5 @@
+#include <tuple>
+
 #include "host/screens/sharing/FriendDetailCells.h"
 #include "host/screens/sharing/FriendDetailViewController.h"
 #include "host/screens/sharing/FriendInboxBarButtonView.h"
@@ -8,40 +10,7 @@
 namespace tavro {
 namespace {
 
-using Utterances = std::vector<std::string>;
 constexpr const char* kMessages = "Messages, button, Starts a new message to a friend";
-
-/// Answers one message as a test wants it, or raises.
-class OddBadge : public CHFriendInboxBadgeView {
- public:
-  static constexpr Name className = "OddBadge";
-  id text;
-  bool raises = false;
-
-  id oddText() { return raises ? throw NSException(kRangeException, "no count") : text; }
-};
-const Registered oddBadge =
-    defineClass<OddBadge, CHFriendInboxBadgeView>().method<&OddBadge::oddText>("badgeText");
-
-/// A page whose host answers the key of its bar with something else.
-class OddPage : public CHFriendDetailCollectionViewController {
- public:
-  static constexpr Name className = "OddPage";
-  id bar;
-  id oddBar() { return bar; }
-};
-const Registered oddPage =
-    defineClass<OddPage, CHFriendDetailCollectionViewController>().method<&OddPage::oddBar>(
-        "navigationItem");
-
-class OddBar : public NSObject {
- public:
-  static constexpr Name className = "OddBar";
-  id items;
-  id rightItems() { return items; }
-};
-const Registered oddBar =
-    defineClass<OddBar, NSObject>().method<&OddBar::rightItems>("rightBarButtonItems");
 
 Ref<UIBarButtonItem> itemWith(std::string_view title, Name action) {
   const auto item = make<UIBarButtonItem>();
@@ -102,50 +71,47 @@ TEST_F(FriendDetailTest, OnlyTheBarButtonsOfTheLoadAreLabelled) {
 }
 
 TEST_F(FriendDetailTest, OddBarsAreLeftAlone) {
-  const auto page = makeController<OddPage>();
-  const auto bar = make<OddBar>();
-  for (const id& odd : {id(), id(string("bar")), id(bar)}) {
-    page->bar = odd;
-    EXPECT_NO_THROW(send<id>(page, "view"));
-    EXPECT_NO_THROW(send<void>(page, "_accessibilityLoadAccessibilityInformation"));
-  }
+  const auto page = pageOf(false);
+  send<id>(page, "view");
+  const auto bar = make<UINavigationItem>();
   const auto button = sendItem("Write");
-  bar->items = button;  // no list
-  send<void>(page, "_accessibilityLoadAccessibilityInformation");
+  for (const id& noList : {id(), id(button)}) {
+    answers(bar, "rightBarButtonItems", noList);
+    for (const id& odd : {id(), id(string("bar")), id(bar)}) {
+      answers(page, "navigationItem", odd);
+      EXPECT_NO_THROW(load(page));
+    }
+  }
   EXPECT_EQ(heard(button), Utterances{"Write, button"});
-  bar->items = arrayWithObjects({string("no item"), make<UIBarButtonItem>(), button});
-  send<void>(page, "_accessibilityLoadAccessibilityInformation");
+  answers(bar, "rightBarButtonItems",
+          arrayWithObjects({string("no item"), make<UIBarButtonItem>(), button}));
+  load(page);
   EXPECT_EQ(heard(button), Utterances{kMessages});
 }
 
-TEST_F(FriendDetailTest, APageReadsGoalsAndActionsAndItsButtonStillWrites) {
+TEST_F(FriendDetailTest, TheLabelledButtonStillWrites) {
   const auto page = pageOf(false);
   window->setRootViewController(page);
-  EXPECT_EQ(heard(window),
-            (Utterances{"Ines, heading", kMessages, "Move, 412 of 460 kcal",
-                        "Exercise, -- of 0 min", "Stand, -- of 0 hr", "Mute Notifications, button",
-                        "Hide My Activity, button", "Remove Friend, button"}));
-  ASSERT_TRUE(send<bool>(page->navigationItem()->rightBarButtonItem(), "accessibilityActivate"));
+  ASSERT_TRUE(activate(page->navigationItem()->rightBarButtonItem()));
   const Utterances spoken = heard(window);
   EXPECT_EQ((Utterances{spoken.end() - 3, spoken.end()}),
             (Utterances{"New Message", "Cancel, button", "To: Ines"}));
-  window->setRootViewController(pageOf(true));
-  EXPECT_EQ(heard(window).back(), "Share Today's Activity, button");
+  EXPECT_EQ(heardOn(pageOf(true)).back(), "Share Today's Activity, button");
 }
 
 TEST_F(FriendDetailTest, AGoalIsItsTitleWithItsSubtitleAsValue) {
   const auto cell = makeView<CHFriendDetailGoalCell>({0, 0, 390, 60});
   cell->_titleLabel->setText(string("Move"));
   cell->_subtitleLabel->setText(string("412KCAL"));
-  EXPECT_TRUE(send<bool>(cell, "isAccessibilityElement"));
+  EXPECT_TRUE(isElement(cell));
   EXPECT_EQ(labelOf(cell), "Move");
   EXPECT_EQ(valueOf(cell), "412KCAL");
-  send<void>(cell->_subtitleLabel, "setAccessibilityLabel:", string("412 kilocalories"));
+  setLabel(cell->_subtitleLabel, "412 kilocalories");
   EXPECT_EQ(valueOf(cell), "412 kilocalories") << "what a label says, not what it shows";
   cell->_titleLabel = nullptr;
   EXPECT_EQ(heard(cell), Utterances{"412 kilocalories"});
   cell->_subtitleLabel = nullptr;
-  EXPECT_TRUE(send<bool>(cell, "isAccessibilityElement"));
+  EXPECT_TRUE(isElement(cell));
   EXPECT_EQ(heard(cell), Utterances());
 }
 
@@ -159,55 +125,41 @@ TEST_F(FriendDetailTest, AnActionIsAButtonNamedByItsFirstLabel) {
   cell->addSubview(box);
   cell->addSubview(makeLabel("Later"));
   EXPECT_EQ(heard(cell), Utterances{"Nested, button"});
-  send<void>(cell, "setAccessibilityTraits:", UIAccessibilityTraitSelected);
-  EXPECT_EQ(send<UIAccessibilityTraits>(cell, "accessibilityTraits"),
-            UIAccessibilityTraitSelected | UIAccessibilityTraitButton);
+  setTraits(cell, UIAccessibilityTraitSelected);
+  EXPECT_EQ(traitsOf(cell), UIAccessibilityTraitSelected | UIAccessibilityTraitButton);
 }
 
 TEST_F(FriendDetailTest, TheInboxButtonSaysWhatItsBadgeCounts) {
-  struct Case {
-    const char* locale;
-    const char* text;
-    const char* value;
-  };
-  const Case cases[] = {
-      {"en_US", "3", "3 new items"},
-      {"en_US", "1", "1 new item"},
-      {"en_US", "0", ""},
-      {"en_US", "-3", ""},
-      {"en_US", "", ""},
-      {"en_US", "abc", ""},
-      {"en_US", "3 new", ""},
-      {"en_US", " 3", ""},
-      {"en_US", "3.7", "3 new items"},
-      {"en_US", "0.9", ""},
-      {"de_DE", "3,7", "3 neue Einträge"},
-      {"de_DE", "3.7", ""},
-      {"ar_EG", "٣", "3 عناصر جديدة"},
-      {"en_US", "99999999999", "2147483647 new items"},
+  const std::tuple<const char*, const char*, const char*> cases[] = {
+      {"en_US", "3", "3 new items"},       {"en_US", "1", "1 new item"},
+      {"en_US", "3.7", "3 new items"},     {"en_US", "0.9", ""},
+      {"de_DE", "3,7", "3 neue Einträge"}, {"de_DE", "3.7", ""},
+      {"ar_EG", "٣", "3 عناصر جديدة"},     {"en_US", "99999999999", "2147483647 new items"},
   };
   const auto button = makeView<CHFriendInboxBarButtonView>();
-  const auto badge = makeView<OddBadge>();
-  button->_badgeView = badge;
-  for (const Case& each : cases) {
-    Settings::current().locale = each.locale;
-    badge->text = string(each.text);
-    EXPECT_EQ(valueOf(button), each.value) << each.locale << " \"" << each.text << "\"";
+  for (const auto& [locale, text, value] : cases) {
+    Settings::current().locale = locale;
+    answers(button->_badgeView, "badgeText", string(text));
+    EXPECT_EQ(valueOf(button), value) << locale << " \"" << text << "\"";
+  }
+  Settings::current().locale = "en_US";
+  for (const char* const text : {"0", "-3", "", "abc", "3 new", " 3"}) {
+    answers(button->_badgeView, "badgeText", string(text));
+    EXPECT_EQ(valueOf(button), "") << text;
   }
 }
 
 TEST_F(FriendDetailTest, TheInboxButtonIsNamedWhateverItsBadgeIs) {
+  const Utterances nameAlone{"Friends inbox, button"};
   const auto button = makeView<CHFriendInboxBarButtonView>();
-  const auto badge = makeView<OddBadge>();
   for (const id& noText : {id(), id(number(std::int64_t{3})), id(makeLabel("3"))}) {
-    badge->text = noText;
-    button->_badgeView = badge;
-    EXPECT_EQ(heard(button), Utterances{"Friends inbox, button"});
+    answers(button->_badgeView, "badgeText", noText);
+    EXPECT_EQ(heard(button), nameAlone);
   }
-  badge->raises = true;
-  EXPECT_EQ(valueOf(button), "");
+  raises(button->_badgeView, "badgeText");
+  EXPECT_EQ(heard(button), nameAlone);
   button->_badgeView = nullptr;
-  EXPECT_EQ(heard(button), Utterances{"Friends inbox, button"});
+  EXPECT_EQ(heard(button), nameAlone);
 }
 
 }  // namespace

@@ -4,39 +4,6 @@
 namespace tavro {
 namespace {
 
-using Utterances = std::vector<std::string>;
-
-/// Takes down which buttons were pressed, and may raise when one is.
-class PressRecorder : public NSObject {
- public:
-  static constexpr Name className = "PressRecorder";
-  std::vector<id> pressed;
-  bool raises = false;
-
-  void press(const id& button) {
-    pressed.push_back(button);
-    if (raises) {
-      raise(kRangeException, "no goal");
-    }
-  }
-};
-const Registered recorder = defineClass<PressRecorder, NSObject>().method<&PressRecorder::press>(
-    "_performPlusMinusActionWithButton:");
-
-/// A goal view with another controller, and something else under its plus button's key.
-class OddGoalView : public CHASActivitySetupGoalView {
- public:
-  static constexpr Name className = "OddGoalView";
-  id controller;
-  id plus;
-
-  id oddController() { return controller; }
-  id oddPlus() { return plus; }
-};
-const Registered oddGoalView = defineClass<OddGoalView, CHASActivitySetupGoalView>()
-                                   .method<&OddGoalView::oddController>("buttonController")
-                                   .method<&OddGoalView::oddPlus>("_plusButton");
-
 class GoalSetupTest : public PluginTest {
  protected:
   void SetUp() override {
@@ -57,6 +24,15 @@ class GoalSetupTest : public PluginTest {
     return view;
   }
 
+  /// A controller that takes down which buttons are pressed.
+  id recorder() {
+    const auto controller = make<NSObject>();
+    answers<void, const id&>(controller, "_performPlusMinusActionWithButton:",
+                             [this](const id& button) { pressed.push_back(button); });
+    return controller;
+  }
+
+  std::vector<id> pressed;
   Ref<CHASActivitySetupViewController> setup;
   std::vector<id> movedTo;
 };
@@ -65,17 +41,15 @@ TEST_F(GoalSetupTest, AGoalIsOneAdjustableElementWithItsUnit) {
   const auto view = goalView(30);
   show(view);
   EXPECT_EQ(heard(view), Utterances{"30, minutes, adjustable"});
-  send<void>(view,
-             "setAccessibilityTraits:", UIAccessibilityTraitButton | UIAccessibilityTraitHeader);
-  EXPECT_EQ(send<UIAccessibilityTraits>(view, "accessibilityTraits"),
-            UIAccessibilityTraitAdjustable);
+  setTraits(view, UIAccessibilityTraitButton | UIAccessibilityTraitHeader);
+  EXPECT_EQ(traitsOf(view), UIAccessibilityTraitAdjustable);
   view->_goalLabel->setText(nullptr);
   EXPECT_EQ(valueOf(view), "minutes");
 }
 
 TEST_F(GoalSetupTest, WithoutEitherLabelTheValueIsTheViewsOwn) {
   const auto view = goalView(30);
-  send<void>(view, "setAccessibilityValue:", string("own value"));
+  setValue(view, "own value");
   const auto unit = view->_unitLabel;
   view->_unitLabel = nullptr;
   EXPECT_EQ(valueOf(view), "own value");
@@ -86,33 +60,32 @@ TEST_F(GoalSetupTest, WithoutEitherLabelTheValueIsTheViewsOwn) {
 }
 
 TEST_F(GoalSetupTest, GesturesPressTheHostsButtonsOnce) {
-  const auto view = makeView<OddGoalView>();
-  const auto presses = make<PressRecorder>();
-  view->controller = presses;
-  view->plus = view->_plusButton;
+  const auto view = goalView(30);
+  const id controller = recorder();
+  answers(view, "buttonController", controller);
   send<void>(view, "accessibilityIncrement");
-  EXPECT_EQ(presses->pressed, std::vector<id>{view->_plusButton});
+  EXPECT_EQ(pressed, std::vector<id>{view->_plusButton});
   send<void>(view, "accessibilityDecrement");
-  EXPECT_EQ(presses->pressed, (std::vector<id>{view->_plusButton, view->_minusButton}));
-  presses->raises = true;
+  EXPECT_EQ(pressed, (std::vector<id>{view->_plusButton, view->_minusButton}));
+  answers<void, const id&>(controller, "_performPlusMinusActionWithButton:",
+                           [](const id& /*button*/) { raise(kRangeException, "no goal"); });
   EXPECT_NO_THROW(send<void>(view, "accessibilityIncrement"));
-  EXPECT_EQ(presses->pressed.size(), 3U);
 }
 
 TEST_F(GoalSetupTest, WithoutControllerOrButtonAGestureDoesNothing) {
-  const auto view = makeView<OddGoalView>();
-  const auto presses = make<PressRecorder>();
-  view->controller = presses;
+  const auto view = goalView(30);
+  const id controller = recorder();
+  answers(view, "buttonController", controller);
   for (const id& notAButton : {id(), id(makeLabel("+"))}) {
-    view->plus = notAButton;
+    answers(view, "_plusButton", notAButton);
     send<void>(view, "accessibilityIncrement");
   }
   view->_minusButton = nullptr;
   send<void>(view, "accessibilityDecrement");
-  EXPECT_EQ(presses->pressed, std::vector<id>());
-  view->plus = view->_plusButton;
+  EXPECT_EQ(pressed, std::vector<id>());
+  answers(view, "_plusButton", view->_plusButton);
   for (const id& noController : {id(), id(make<NSObject>())}) {
-    view->controller = noController;
+    answers(view, "buttonController", noController);
     EXPECT_NO_THROW(send<void>(view, "accessibilityIncrement"));
   }
 }
@@ -124,11 +97,11 @@ TEST_F(GoalSetupTest, GesturesAndTapsGoInStepsWithinTheLimits) {
     return valueOf(view);
   };
   EXPECT_EQ(press("accessibilityIncrement"), "53, minutes");
-  ASSERT_TRUE(send<bool>(view->_plusButton, "accessibilityActivate"));
+  ASSERT_TRUE(activate(view->_plusButton));
   EXPECT_EQ(valueOf(view), "58, minutes");
   EXPECT_EQ(press("accessibilityIncrement"), "60, minutes");
   EXPECT_EQ(press("accessibilityIncrement"), "60, minutes");
-  ASSERT_TRUE(send<bool>(view->_minusButton, "accessibilityActivate"));
+  ASSERT_TRUE(activate(view->_minusButton));
   EXPECT_EQ(press("accessibilityDecrement"), "50, minutes");
   EXPECT_EQ(valueOf(goalView(1)), "5, minutes");
 }
@@ -152,7 +125,7 @@ TEST_F(GoalSetupTest, OnlyThePresentedGoalIsHeardAndTheReaderMovesThere) {
       EXPECT_EQ(send<bool>(view, "accessibilityElementsHidden"), view != views[step]);
     }
     movedTo.clear();
-    ASSERT_TRUE(send<bool>(setup->continueButton(), "accessibilityActivate"));
+    ASSERT_TRUE(activate(setup->continueButton()));
   }
   EXPECT_EQ(heard(setup->view()).front(), "Your goals are set, heading");
   EXPECT_EQ(movedTo, std::vector<id>()) << "nothing else was presented";

@@ -1,3 +1,7 @@
+#include <tuple>
+#include <utility>
+#include <vector>
+
 #include "platform/accessibility/Speech.h"
 #include "platform/foundation/NSBundle.h"
 #include "tests/platform/FoundationTesting.h"
@@ -19,65 +23,39 @@ class SpeakersLanguage : public FoundationTest {
 };
 
 TEST_F(SpeakersLanguage, IsTheNearestThatExists) {
-  constexpr std::pair<const char*, const char*> kChoices[] = {
-      {"en_US", "en"},
-      {"en_CA", "en"},
-      {"en_AU", "en-GB"},
-      {"en_IN", "en-GB"},
-      {"en_GB", "en-GB"},
-      {"es_ES", "es"},
-      {"es_MX", "es-419"},
-      {"es_US", "es-419"},
-      {"es_GQ", "es"},
-      {"fr_BE", "fr"},
-      {"fr_CA", "fr-CA"},
-      {"pt", "pt-BR"},
-      {"pt_AO", "pt-PT"},
-      {"pt_CV", "pt-PT"},
-      {"zh_CN", "zh-Hans"},
-      {"zh_SG", "zh-Hans"},
-      {"zh_TW", "zh-Hant"},
-      {"zh_HK", "zh-Hant"},
-      {"yue_HK", "zh-Hant"},
-      {"no_NO", "nb"},
-      {"nb_NO", "nb"},
-      {"nn_NO", "nb"},
-      {"iw_IL", "he"},
-      {"in_ID", "id"},
-      {"fa_AF", "fa"},
-      {"ar_MA", "ar"},
-      {"ro_MD", "ro"},
-      {"bs_BA", "hr"},
-      {"ca_ES", "ca"},
-      {"gl_ES", "es"},
-      {"af_ZA", "nl"},
-      {"de_CH", "de"},
-      {"be_BY", "ru"},
-      {"kk_KZ", "ru"},
-      {"sr_RS", "en"},
-      {"sr_Latn", "en"},
-      {"sl_SI", "en"},
-      {"bn_BD", "en"},
-      {"th_TH@calendar=buddhist", "th"},
-      {"ar_EG@numbers=latn", "ar"},
+  // A language, and the locales that hear it.
+  const std::pair<const char*, std::vector<const char*>> choices[] = {
+      {"en", {"en_US", "en_CA", "sr_RS", "sr_Latn", "sl_SI", "bn_BD"}},
+      {"en-GB", {"en_GB", "en_AU", "en_IN"}},
+      {"es", {"es_ES", "es_GQ", "gl_ES"}},
+      {"es-419", {"es_MX", "es_US"}},
+      {"fr", {"fr_BE"}},
+      {"fr-CA", {"fr_CA"}},
+      {"pt-BR", {"pt"}},
+      {"pt-PT", {"pt_AO", "pt_CV"}},
+      {"zh-Hans", {"zh_CN", "zh_SG"}},
+      {"zh-Hant", {"zh_TW", "zh_HK", "yue_HK"}},
+      {"nb", {"no_NO", "nb_NO", "nn_NO"}},
+      {"he", {"iw_IL"}},
+      {"id", {"in_ID"}},
+      {"hr", {"bs_BA"}},
+      {"nl", {"af_ZA"}},
+      {"ru", {"be_BY", "kk_KZ"}},
+      {"ar", {"ar_MA", "ar_EG@numbers=latn"}},
+      {"th", {"th_TH@calendar=buddhist"}},
   };
-  for (const auto& [locale, language] : kChoices) {
-    settings_.locale = locale;
-    EXPECT_EQ(bundle("plugin")->languageForTable("Accessibility"), language) << locale;
-    EXPECT_EQ(bundle("reader")->languageForTable("Reader"), language) << locale;
+  for (const auto& [language, locales] : choices) {
+    for (const char* const locale : locales) {
+      settings_.locale = locale;
+      EXPECT_EQ(bundle("plugin")->languageForTable("Accessibility"), language) << locale;
+      EXPECT_EQ(bundle("reader")->languageForTable("Reader"), language) << locale;
+    }
   }
 }
 
 // Integers stand in plain digits, which every voice reads; what ICU writes has the user's digits.
 TEST_F(SpeakersLanguage, CountsAndMeasuresInItsOwnWay) {
-  struct Spoken {
-    const char* locale;
-    std::int64_t minutes;
-    const char* counted;
-    float calories;
-    const char* measured;
-  };
-  constexpr Spoken kSpoken[] = {
+  const std::tuple<const char*, std::int64_t, const char*, float, const char*> cases[] = {
       {"en_US", 1, "1 minute", 3.6, "3.6 calories"},
       {"de_DE", 40, "40 Minuten", 3.6, "3,6 Kalorien"},
       {"fr_FR", 0, "0 minute", 1234.5, "1\u202F234,5 calories"},
@@ -97,13 +75,11 @@ TEST_F(SpeakersLanguage, CountsAndMeasuresInItsOwnWay) {
       {"hi_IN", 40, "40 मिनट", 123456, "1,23,456 कैलोरी"},
       {"ja_JP", 40, "40分", 3.6, "3.6キロカロリー"},
   };
-  for (const Spoken& spoken : kSpoken) {
-    settings_.locale = spoken.locale;
-    EXPECT_EQ(utf8(stringWithFormat(format("minutes.format"), {spoken.minutes})), spoken.counted)
-        << spoken.locale;
-    const Ref<NSString> amount = AXFormatFloat(0, spoken.calories);
-    EXPECT_EQ(utf8(stringWithFormat(format("calories.format"), {id(amount)})), spoken.measured)
-        << spoken.locale;
+  for (const auto& [locale, minutes, counted, calories, measured] : cases) {
+    settings_.locale = locale;
+    EXPECT_EQ(utf8(stringWithFormat(format("minutes.format"), {minutes})), counted) << locale;
+    const id amount = AXFormatFloat(0, calories);
+    EXPECT_EQ(utf8(stringWithFormat(format("calories.format"), {amount})), measured) << locale;
   }
 }
 

@@ -1,3 +1,5 @@
+#include <tuple>
+
 #include "host/screens/workouts/WorkoutDetailCells.h"
 #include "host/screens/workouts/WorkoutDetailController.h"
 #include "host/screens/workouts/WorkoutRecords.h"
@@ -6,7 +8,6 @@
 namespace tavro {
 namespace {
 
-using Utterances = std::vector<std::string>;
 using TwoValueCell = CHWorkoutDetailTwoValueTableViewCell;
 using Header = CHWorkoutDetailExpandingHeaderView;
 
@@ -37,7 +38,7 @@ class WorkoutDetailTest : public PluginTest {
 
   static id valueWithLabel(std::string_view text, std::string_view label) {
     const id made = attributedString(string(text));
-    send<void>(made, "setAccessibilityLabel:", string(label));
+    setLabel(made, label);
     return made;
   }
 
@@ -45,59 +46,33 @@ class WorkoutDetailTest : public PluginTest {
     return send<id>(send<id>(Class::named("AXGroupedTitleValueView"), "alloc"),
                     "initWithAccessibilityContainer:titleView:valueView:", container, title, value);
   }
-
-  /// What is heard above the heart-rate chart.
-  Utterances heardOfWorkout(const Workout& workout) {
-    const auto controller = makeController<WorkoutDetailController>();
-    controller->setWorkout(&workout);
-    window->setRootViewController(controller);
-    Utterances figures = heard(window);
-    figures.erase(std::ranges::find(figures, "Heart Rate"), figures.end());
-    return figures;
-  }
 };
 
-TEST_F(WorkoutDetailTest, AWorkoutIsHeardInPairsAndItsDurationsInWords) {
-  Workout run = workoutOf(HKWorkoutActivityType::running, 10000);
-  run.elevation = 27;
-  run.heartRate = {{0, 100}, {60, 151}};
-  run.splits = {{1000, 376}, {578, 218}};
-  EXPECT_EQ(
-      heardOfWorkout(run),
-      (Utterances{"Outdoor Run, heading", "Total Time, 1 hour, 2 minutes, 3 seconds",
-                  "Distance, 10 kilometers", "Active Energy, 315 kilocalories",
-                  "Elevation Gain, 27 meters", "Average Heart Rate, 126 beats per minute",
-                  "Highest Heart Rate, 151 beats per minute",
-                  "Average Pace, 6 minutes, 12 seconds per km", "Splits, button, heading, expanded",
-                  "KM 1, 6 minutes, 16 seconds", "KM 2, 0.58 KM, 6 minutes, 17 seconds"}));
-}
-
 TEST_F(WorkoutDetailTest, WhatWasNotRecordedIsNoDataAndWhatIsNotOfTheActivityIsLeftOut) {
-  EXPECT_EQ(
-      heardOfWorkout(workoutOf(HKWorkoutActivityType::yoga, std::nullopt)),
-      (Utterances{"Yoga, heading", "Total Time, 1 hour, 2 minutes, 3 seconds", "Distance, No data",
-                  "Active Energy, 315 kilocalories", "Elevation Gain, No data",
-                  "Average Heart Rate, No data", "Highest Heart Rate, No data"}));
+  const Workout yoga = workoutOf(HKWorkoutActivityType::yoga, std::nullopt);
+  const auto controller = makeController<WorkoutDetailController>();
+  controller->setWorkout(&yoga);
+  Utterances figures = heardOn(controller);
+  figures.resize(8);
+  EXPECT_EQ(figures, (Utterances{"Yoga, heading", "Total Time, 1 hour, 2 minutes, 3 seconds",
+                                 "Distance, No data", "Active Energy, 315 kilocalories",
+                                 "Elevation Gain, No data", "Average Heart Rate, No data",
+                                 "Highest Heart Rate, No data", "Heart Rate"}));
 }
 
 TEST_F(WorkoutDetailTest, ThePaceCellSaysItsPaceAsADuration) {
-  struct Case {
-    HKWorkoutActivityType type;
-    std::optional<double> distance;
-    const char* heard;
-  };
-  const Case cases[] = {
+  const std::tuple<HKWorkoutActivityType, std::optional<double>, const char*> cases[] = {
       {HKWorkoutActivityType::running, 10000, "Average Pace, 6 minutes, 12 seconds per km"},
       {HKWorkoutActivityType::swimming, 3000, "Average Pace, 2 minutes, 4 seconds per 100 m"},
       {HKWorkoutActivityType::walking, std::nullopt, "Average Pace, No data"},
       {HKWorkoutActivityType::walking, 0, "Average Pace, No data"},
       {HKWorkoutActivityType::cycling, 20000, "Average Speed, 19.3 km/h"},
   };
-  for (const Case& each : cases) {
+  for (const auto& [type, distance, expected] : cases) {
     const auto cell = makeView<CHWorkoutDetailPaceTableViewCell>({0, 0, 390, 56});
-    configure(cell, each.type, each.distance);
+    configure(cell, type, distance);
     show(cell);
-    EXPECT_EQ(heard(cell), Utterances{each.heard});
+    EXPECT_EQ(heard(cell), Utterances{expected});
   }
 }
 
@@ -112,11 +87,11 @@ TEST_F(WorkoutDetailTest, AConfigurationForCyclingRenewsNothing) {
   configure(cell, HKWorkoutActivityType::walking, 5000);
   EXPECT_EQ(heard(cell), Utterances{"Average Pace, 12 minutes, 25 seconds per km"});
   cell->_valueLabel->setText(nullptr);
-  send<void>(cell, "_accessibilityLoadAccessibilityInformation");
+  load(cell);
   EXPECT_EQ(send<id>(cell, "accessibilityValue"), nullptr);
   cell->_titleLabel = nullptr;
   cell->_valueLabel = nullptr;
-  send<void>(cell, "_accessibilityLoadAccessibilityInformation");
+  load(cell);
   EXPECT_EQ(send<id>(cell, "accessibilityUserDefinedLabel"), nullptr);
 }
 
@@ -172,7 +147,7 @@ TEST_F(WorkoutDetailTest, AValueSaysNoDataOrTheLabelThatItCarriesOrItsText) {
 
 TEST_F(WorkoutDetailTest, TheTwoPairsAreMadeOnceAllFourLabelsAreThere) {
   const auto cell = twoValues(attributedString(string("1")), attributedString(string("2")));
-  EXPECT_FALSE(send<bool>(cell, "isAccessibilityElement"));
+  EXPECT_FALSE(isElement(cell));
   for (Ref<UILabel> TwoValueCell::*const label :
        {&TwoValueCell::_titleLabel1, &TwoValueCell::_valueLabel1, &TwoValueCell::_titleLabel2,
         &TwoValueCell::_valueLabel2}) {
@@ -197,8 +172,8 @@ TEST_F(WorkoutDetailTest, AGroupIsAnElementWhileBothItsViewsSaySomething) {
     Utterances heard;
   };
   const Ref<UILabel> spoken = makeLabel("5 KM");
-  send<void>(spoken, "setAccessibilityLabel:", string("5 kilometers"));
-  send<void>(spoken, "setAccessibilityValue:", string("unheard"));
+  setLabel(spoken, "5 kilometers");
+  setValue(spoken, "unheard");
   const Case cases[] = {
       {makeLabel("Distance"), spoken, {"Distance, 5 kilometers"}},
       {makeLabel("Distance"), makeLabel(""), {}},
@@ -217,10 +192,9 @@ TEST_F(WorkoutDetailTest, AGroupIsAnElementWhileBothItsViewsSaySomething) {
   EXPECT_EQ(heard(element), Utterances());
   title->setText(string("Laps"));
   EXPECT_EQ(heard(element), Utterances{"Laps, 1"}) << "read anew at each request";
-  EXPECT_EQ(send<CGRect>(element, "accessibilityFrame"), CGRect(10, 20, 100, 60));
+  EXPECT_EQ(frameOf(element), CGRect(10, 20, 100, 60));
   EXPECT_EQ(send<id>(element, "accessibilityContainer"), cell);
-  EXPECT_EQ(send<CGRect>(group(cell, title, nullptr), "accessibilityFrame"),
-            CGRect(10, 20, 100, 30));
+  EXPECT_EQ(frameOf(group(cell, title, nullptr)), CGRect(10, 20, 100, 30));
 }
 
 TEST_F(WorkoutDetailTest, AnExpandingHeaderIsAHeadingAndAButtonAndSaysWhetherItIsOpen) {
@@ -228,10 +202,8 @@ TEST_F(WorkoutDetailTest, AnExpandingHeaderIsAHeadingAndAButtonAndSaysWhetherItI
   header->setTitle("Splits");
   show(header);
   EXPECT_EQ(heard(header), Utterances{"Splits, button, heading, expanded"});
-  send<void>(header, "setAccessibilityTraits:",
-             UIAccessibilityTraitSelected | UIAccessibilityTraitAdjustable);
-  EXPECT_EQ(send<UIAccessibilityTraits>(header, "accessibilityTraits"),
-            UIAccessibilityTraitButton | UIAccessibilityTraitHeader);
+  setTraits(header, UIAccessibilityTraitSelected | UIAccessibilityTraitAdjustable);
+  EXPECT_EQ(traitsOf(header), UIAccessibilityTraitButton | UIAccessibilityTraitHeader);
   header->setExpanded(false);
   EXPECT_EQ(heard(header), Utterances{"Splits, button, heading, collapsed"});
   header->_titleLabel = nullptr;

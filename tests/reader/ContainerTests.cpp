@@ -5,6 +5,7 @@
 #include "platform/uikit/UIViewController.h"
 #include "reader/Containers.h"
 #include "reader/Output.h"
+#include "tests/support/Elements.h"
 
 namespace tavro {
 namespace {
@@ -15,11 +16,10 @@ class ContainerTest : public testing::Test {
   void SetUp() override {
     setReaderResources(std::string(TAVRO_SOURCE) + "/reader/resources");
     Settings::current().locale = "en_US";
-    send<void>(chart, "setAccessibilityLabel:", string("Steps"));
+    setLabel(chart, "Steps");
     fill(chart, {"Mon", "Tue", "Wed"});
     fill(alone, {"Only"});
-    send<void>(row,
-               "setAccessibilityElements:", arrayWithObjects({makeLabel("Title"), chart, alone}));
+    setElements(row, {makeLabel("Title"), chart, alone});
     window->makeKey();
     window->addSubview(row);
     window->addSubview(makeLabel("After", {0, 500, 390, 40}));
@@ -28,10 +28,9 @@ class ContainerTest : public testing::Test {
   static void fill(const Ref<UIView>& container, const std::vector<std::string>& labels) {
     std::vector<id> elements;
     for (const std::string& label : labels) {
-      elements.emplace_back(accessibilityElementWithContainer(container));
-      send<void>(elements.back(), "setAccessibilityLabel:", string(label));
+      elements.emplace_back(drawnElement(container, label));
     }
-    send<void>(container, "setAccessibilityElements:", arrayWithObjects(std::move(elements)));
+    setElements(container, std::move(elements));
   }
 
   Ref<UIWindow> window = makeView<UIWindow>({0, 0, 390, 844});
@@ -52,8 +51,8 @@ TEST_F(ContainerTest, AreHeardOnEnteringAndLeaving) {
 TEST_F(ContainerTest, AnElementThatStandsForOthersIsNotDrawn) {
   const auto pair = make<UIAccessibilityAggregateElement>();
   pair->initWithContainerAndElements(chart, nullptr);
-  send<void>(pair, "setAccessibilityLabel:", string("Pair"));
-  send<void>(chart, "setAccessibilityElements:", arrayWithObjects({pair, pair}));
+  setLabel(pair, "Pair");
+  setElements(chart, {pair, pair});
   const auto elements = accessibleElements(chart);
   EXPECT_EQ(ContainerSpeech(Verbosity::containers, elements).whereabouts(0), "Steps, group");
 }

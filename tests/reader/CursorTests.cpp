@@ -1,47 +1,18 @@
 #include <gtest/gtest.h>
 
 #include <stdexcept>
+#include <tuple>
 
 #include "platform/foundation/Settings.h"
 #include "platform/uikit/UITables.h"
 #include "platform/uikit/UIViewController.h"
 #include "reader/Cursor.h"
+#include "tests/support/Elements.h"
 
 namespace tavro {
 namespace {
 
 using Utterances = std::vector<std::string>;
-
-/// A value between 0 and 3 that is changed by adjusting.
-class Stepper : public UIView {
- public:
-  static constexpr Name className = "CursorTestStepper";
-  std::int64_t value = 2;
-
-  void increment() { value = std::min<std::int64_t>(value + 1, 3); }
-  void decrement() { value = std::max<std::int64_t>(value - 1, 0); }
-  id valueText() { return string(std::to_string(value)); }
-};
-
-const Registered stepperClass = defineClass<Stepper, UIView>()
-                                    .method<&Stepper::increment>("accessibilityIncrement")
-                                    .method<&Stepper::decrement>("accessibilityDecrement")
-                                    .method<&Stepper::valueText>("accessibilityValue");
-
-/// A row whose columns are told by the hit test alone.
-class Columns : public UIView {
- public:
-  static constexpr Name className = "CursorTestColumns";
-
-  id hit(CGPoint point, const id& /*event*/) {
-    const auto elements = as<NSArray>(send<id>(this, "accessibilityElements"));
-    const auto column = static_cast<std::size_t>(point.x / 100);
-    return column < elements->count() ? (*elements)[column] : id();
-  }
-};
-
-const Registered columnsClass =
-    defineClass<Columns, UIView>().method<&Columns::hit>("_accessibilityHitTest:withEvent:");
 
 class CursorTest : public testing::Test {
  protected:
@@ -54,7 +25,7 @@ class CursorTest : public testing::Test {
 
   Ref<UILabel> add(const std::string& text, UIAccessibilityTraits traits = 0) {
     const auto label = makeLabel(text, {0, nextY_, 390, 40});
-    send<void>(label, "setAccessibilityTraits:", traits);
+    setTraits(label, traits);
     screen->addSubview(label);
     nextY_ += 40;
     return label;
@@ -70,24 +41,20 @@ class CursorTest : public testing::Test {
   }
 
   /// Elements of one container, a width apart; frames in screen coordinates.
-  static Ref<NSArray> drawn(const Ref<UIView>& container, const Utterances& labels, CGRect frame) {
+  static void draw(const Ref<UIView>& container, const Utterances& labels, CGRect frame) {
     std::vector<id> elements;
     for (const std::string& label : labels) {
-      const auto element = accessibilityElementWithContainer(container);
-      send<void>(element, "setAccessibilityLabel:", string(label));
-      send<void>(element, "setAccessibilityFrame:", frame);
+      elements.emplace_back(drawnElement(container, label));
+      send<void>(elements.back(), "setAccessibilityFrame:", frame);
       frame.origin.x += frame.size.width;
-      elements.emplace_back(element);
     }
-    const auto list = arrayWithObjects(std::move(elements));
-    send<void>(container, "setAccessibilityElements:", list);
-    return list;
+    setElements(container, std::move(elements));
   }
 
   Ref<UIView> addChart(const Utterances& labels) {
     const auto chart = makeView<UIView>({0, nextY_, 390, 40});
     screen->addSubview(chart);
-    drawn(chart, labels, {0, nextY_, 50, 40});
+    draw(chart, labels, {0, nextY_, 50, 40});
     nextY_ += 40;
     return chart;
   }
@@ -160,7 +127,7 @@ TEST_F(CursorTest, StaysOnWhatItIsOnWhenTheScreenChanges) {
   Cursor cursor(screen);
   ASSERT_TRUE(cursor.find("two"));
 
-  drawn(chart, {"one", "two", "three"}, {0, 40, 50, 40});
+  draw(chart, {"one", "two", "three"}, {0, 40, 50, 40});
   cursor.update();
   EXPECT_EQ(here(cursor), "two") << "a chart that was built anew";
 
@@ -169,7 +136,7 @@ TEST_F(CursorTest, StaysOnWhatItIsOnWhenTheScreenChanges) {
   cursor.update();
   EXPECT_EQ(here(cursor), "two") << "something new before it";
 
-  drawn(chart, {"one", "three"}, {0, 40, 50, 40});
+  draw(chart, {"one", "three"}, {0, 40, 50, 40});
   cursor.update();
   EXPECT_EQ(here(cursor), "one") << "gone: the nearest earlier one that is left";
 
@@ -219,13 +186,13 @@ TEST_F(CursorTest, FollowsNotifications) {
   };
   for (const Case& each : cases) {
     SCOPED_TRACE(each.name);
-    drawn(chart, {"one", "two"}, {0, 40, 50, 40});
+    draw(chart, {"one", "two"}, {0, 40, 50, 40});
     Cursor cursor(screen);
     ASSERT_TRUE(cursor.find("two"));
     UIAccessibilityPostNotification(each.notification, each.argument);
     EXPECT_EQ(here(cursor), "two") << "followed when the change is over";
     if (each.focusGoes) {
-      drawn(chart, {"one"}, {0, 40, 50, 40});
+      draw(chart, {"one"}, {0, 40, 50, 40});
     }
     cursor.update();
     EXPECT_EQ(here(cursor), each.heard);
@@ -255,11 +222,16 @@ TEST_F(CursorTest, ATouchHearsWhatLiesThere) {
   const auto lower = makeView<UIView>({0, 60, 390, 60});
   screen->addSubview(upper);
   screen->addSubview(lower);
-  drawn(upper, {"1", "2", "3"}, {0, 0, 100, 130});
-  drawn(lower, {"8", "9", "10"}, {0, 60, 100, 130});
-  const auto columns = makeView<Columns>({50, 300, 300, 40});
+  draw(upper, {"1", "2", "3"}, {0, 0, 100, 130});
+  draw(lower, {"8", "9", "10"}, {0, 60, 100, 130});
+  const auto columns = makeView<UIView>({50, 300, 300, 40});  // told by its hit test alone
+  answers<id, CGPoint, const id&>(
+      columns, "_accessibilityHitTest:withEvent:", [&](CGPoint point, const id& /*event*/) {
+        const auto column = static_cast<std::size_t>(point.x / 100);
+        return column < 2 ? (*elementsOf(columns))[column] : id();
+      });
   screen->addSubview(columns);
-  drawn(columns, {"Mon", "Tue"}, {0, 0, 0, 0});
+  draw(columns, {"Mon", "Tue"}, {0, 0, 0, 0});
   const auto cell = makeView<UITableViewCell>({0, 400, 390, 40});
   cell->addSubview(makeLabel("Runs", {10, 10, 100, 20}));
   screen->addSubview(cell);
@@ -267,16 +239,12 @@ TEST_F(CursorTest, ATouchHearsWhatLiesThere) {
   veil->setHidden(true);
   screen->addSubview(veil);
   const auto pair = makeView<UIView>({0, 600, 390, 40});
-  drawn(pair, {"left", "right"}, {0, 600, 100, 40});
+  draw(pair, {"left", "right"}, {0, 600, 100, 40});
   screen->addSubview(pair);
   const auto silent = makeLabel("", {0, 700, 390, 40});
   screen->addSubview(silent);
 
-  struct Case {
-    CGPoint point;
-    const char* heard;
-  };
-  const Case cases[] = {
+  const std::pair<CGPoint, const char*> cases[] = {
       {{50, 30}, "1"},
       {{150, 30}, "2"},
       {{150, 65}, "9"},  // nearer to the centre of 2, but in the row of 9
@@ -293,12 +261,12 @@ TEST_F(CursorTest, ATouchHearsWhatLiesThere) {
       {{500, 2000}, "(nothing)"},
       {{-1, 30}, "(nothing)"},
   };
-  for (const Case& each : cases) {
-    SCOPED_TRACE(testing::Message() << each.point.x << "," << each.point.y);
+  for (const auto& [point, expected] : cases) {
+    SCOPED_TRACE(testing::Message() << point.x << "," << point.y);
     Cursor cursor(window);
     ASSERT_TRUE(cursor.move(Move::first));
-    const bool touched = cursor.touch(each.point);
-    EXPECT_EQ(touched ? here(cursor) : "(nothing)", each.heard);
+    const bool touched = cursor.touch(point);
+    EXPECT_EQ(touched ? here(cursor) : "(nothing)", expected);
   }
 }
 
@@ -353,20 +321,16 @@ TEST_F(CursorTest, ActivationReachesWhatTakesIt) {
                count();
                return true;
              }));
-  struct Case {
-    const char* label;
-    bool handled;
-    int taps;
-  };
-  constexpr Case cases[] = {{"Button", true, 1}, {"Header", true, 1}, {"Raises", true, 1},
-                            {"Empty", false, 0}, {"Text", false, 0},  {"Block", true, 1}};
-  for (const Case& each : cases) {
-    SCOPED_TRACE(each.label);
+  const std::tuple<const char*, bool, int> cases[] = {{"Button", true, 1}, {"Header", true, 1},
+                                                      {"Raises", true, 1}, {"Empty", false, 0},
+                                                      {"Text", false, 0},  {"Block", true, 1}};
+  for (const auto& [label, handled, expected] : cases) {
+    SCOPED_TRACE(label);
     Cursor cursor(window);
-    ASSERT_TRUE(cursor.find(each.label));
+    ASSERT_TRUE(cursor.find(label));
     taps = 0;
-    EXPECT_EQ(cursor.activate(), each.handled);
-    EXPECT_EQ(taps, each.taps);
+    EXPECT_EQ(cursor.activate(), handled);
+    EXPECT_EQ(taps, expected);
   }
 }
 
@@ -382,14 +346,15 @@ TEST_F(CursorTest, AnActivationThatChangesTheScreenIsFollowed) {
 }
 
 TEST_F(CursorTest, AdjustingSpeaksTheNewValue) {
-  const auto stepper = makeView<Stepper>({0, 0, 390, 40});
-  send<void>(stepper, "setIsAccessibilityElement:", true);
-  send<void>(stepper, "setAccessibilityLabel:", string("Goal"));
-  screen->addSubview(stepper);
+  int goal = 2;  // from 0 to 3
+  const auto stepper = add("Goal");
+  answers<void>(stepper, "accessibilityIncrement", [&] { goal = std::min(goal + 1, 3); });
+  answers<void>(stepper, "accessibilityDecrement", [&] { goal = std::max(goal - 1, 0); });
+  answers<id>(stepper, "accessibilityValue", [&] { return string(std::to_string(goal)); });
   Cursor cursor(screen);
   EXPECT_FALSE(cursor.increment()) << "it does not say that it is adjustable";
-  EXPECT_EQ(stepper->value, 2);
-  send<void>(stepper, "setAccessibilityTraits:", UIAccessibilityTraitAdjustable);
+  EXPECT_EQ(goal, 2);
+  setTraits(stepper, UIAccessibilityTraitAdjustable);
   Utterances heard;
   const auto note = [&](bool adjusted) {
     heard.push_back(adjusted ? utteranceAfterAdjusting(*cursor.current()) : "(refused)");

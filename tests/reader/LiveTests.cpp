@@ -25,11 +25,7 @@ class TerminalSession {
   explicit TerminalSession(std::vector<std::string> arguments = {}) {
     arguments.insert(arguments.begin(), {narrelPath(), "live", "day", "--now", "2026-03-11T15:20",
                                          "--timezone", "Europe/Lisbon"});
-    std::vector<char*> words;
-    for (std::string& argument : arguments) {
-      words.push_back(argument.data());
-    }
-    words.push_back(nullptr);
+    const std::vector<char*> words = wordsOf(arguments);
     // The terminal's other end stays open here, so that its modes can be read after the session.
     if (openpty(&keyboard_, &terminal_, nullptr, nullptr, nullptr) != 0) {
       throw std::runtime_error("no terminal");
@@ -169,21 +165,20 @@ TEST(Live, TabGoesRoundTheScreens) {
 }
 
 TEST(Live, EverySignalPutsTheTerminalBack) {
-  for (const int signal : {SIGINT, SIGTERM, SIGHUP}) {
+  constexpr int kInterruptKey = 0;
+  for (const int signal : {SIGINT, SIGTERM, SIGHUP, kInterruptKey}) {
     SCOPED_TRACE(strsignal(signal));
     TerminalSession session;
     EXPECT_EQ(session.line(), "[day]");
     EXPECT_EQ(session.line(), "Wednesday, March 11, heading");
-    session.signal(signal);
-    EXPECT_EQ(session.end(), 128 + signal);
+    if (signal == kInterruptKey) {
+      session.press("\003");
+    } else {
+      session.signal(signal);
+    }
+    EXPECT_EQ(session.end(), 128 + (signal == kInterruptKey ? SIGINT : signal));
     EXPECT_TRUE(session.terminalIsAsBefore());
   }
-  TerminalSession session;
-  EXPECT_EQ(session.line(), "[day]");
-  EXPECT_EQ(session.line(), "Wednesday, March 11, heading");
-  session.press("\003");  // the interrupt key of the terminal
-  EXPECT_EQ(session.end(), 128 + SIGINT);
-  EXPECT_TRUE(session.terminalIsAsBefore());
 }
 
 TEST(Live, ReadsKeysFromAPipeToo) {
@@ -207,8 +202,7 @@ TEST(Live, ReadsKeysFromAPipeToo) {
 class LiveSpeech : public testing::Test {
  protected:
   void install(const std::string& script) const {
-    const fs::path program = folder.path / "espeak-ng";
-    std::ofstream(program) << "#!/bin/sh\n" << script;
+    const fs::path program = folder.file("espeak-ng", "#!/bin/sh\n" + script);
     fs::permissions(program, fs::perms::owner_all);
   }
 
@@ -218,9 +212,9 @@ class LiveSpeech : public testing::Test {
 };
 
 TEST_F(LiveSpeech, SaysEachUtteranceInItsLanguage) {
-  const fs::path log = folder.path / "log";
-  install("printf '%s|' \"$@\" >> " + log.string() + "\n");
-  lookIn(folder.path.string() + ":/usr/bin:/bin");
+  const std::string log = folder.path() + "/log";
+  install("printf '%s|' \"$@\" >> " + log + "\n");
+  lookIn(folder.path() + ":/usr/bin:/bin");
   const Finished finished =
       runNarrel({"live", "--speak", "--locale", "de_DE", "--now", "2026-03-11T15:20"});
   EXPECT_EQ(finished.code, 0) << finished.error;
@@ -230,23 +224,18 @@ TEST_F(LiveSpeech, SaysEachUtteranceInItsLanguage) {
 
 TEST_F(LiveSpeech, ANewUtteranceStopsTheOneBeforeIt) {
   // Each thing that happens is written into a pipe, which waits for it to be read.
-  const std::string pipe = folder.path / "happened";
+  const std::string pipe = folder.path() + "/happened";
   ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
-  install(
-      "case \"$4\" in\n"
-      "*rings*) echo rings > " +
-      pipe +
-      " ;;\n"
-      "*) trap 'echo stopped > " +
-      pipe +
-      "; kill $!; exit' TERM\n"
-      "   sleep 1000000 &\n"
-      "   echo started > " +
-      pipe +
-      "\n"
-      "   wait ;;\n"
-      "esac\n");
-  lookIn(folder.path.string() + ":/usr/bin:/bin");
+  install("pipe=" + pipe + R"(
+case "$4" in
+*rings*) echo rings > $pipe ;;
+*) trap 'echo stopped > $pipe; kill $!; exit' TERM
+   sleep 1000000 &
+   echo started > $pipe
+   wait ;;
+esac
+)");
+  lookIn(folder.path() + ":/usr/bin:/bin");
   TerminalSession session({"--speak"});
   EXPECT_EQ(contentOf(pipe), "started\n");
   session.press(kRight);
@@ -260,7 +249,7 @@ TEST_F(LiveSpeech, ANewUtteranceStopsTheOneBeforeIt) {
 }
 
 TEST_F(LiveSpeech, IsRefusedWithoutTheProgram) {
-  lookIn(folder.path);
+  lookIn(folder.path());
   const Finished finished = runNarrel({"live", "--speak"}, kRight);
   EXPECT_EQ(finished.code, 2);
   EXPECT_EQ(finished.output, "");

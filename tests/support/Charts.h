@@ -5,8 +5,6 @@
 
 namespace tavro {
 
-using Utterances = std::vector<std::string>;
-
 /// Charts of the day view.
 class ChartTest : public PluginTest {
  protected:

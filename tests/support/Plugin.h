@@ -13,8 +13,11 @@
 #include "platform/foundation/Settings.h"
 #include "platform/uikit/UIViewController.h"
 #include "reader/Model.h"
+#include "tests/support/Elements.h"
 
 namespace tavro {
+
+using Utterances = std::vector<std::string>;
 
 inline std::string bundlePath() { return std::string(TAVRO_BUILD) + "/AXTavro.axbundle"; }
 
@@ -36,8 +39,8 @@ class PluginTest : public testing::Test {
   void show(const Ref<UIView>& view) { window->addSubview(view); }
 
   /// Everything that is said at and below an object, silent elements left out.
-  static std::vector<std::string> heard(const id& root) {
-    std::vector<std::string> utterances;
+  static Utterances heard(const id& root) {
+    Utterances utterances;
     for (const HeardElement& element : readElements(root)) {
       if (!element.utterance.empty()) {
         utterances.push_back(element.utterance);
@@ -46,9 +49,12 @@ class PluginTest : public testing::Test {
     return utterances;
   }
 
-  static Ref<NSArray> elementsOf(const id& container) {
-    return as<NSArray>(send<id>(container, "accessibilityElements"));
+  /// The whole screen of a controller.
+  Utterances heardOn(const Ref<UIViewController>& controller) {
+    window->setRootViewController(controller);
+    return heard(window);
   }
+
   static std::string labelOf(const id& object) {
     return spokenText(send<id>(object, "accessibilityLabel"));
   }

@@ -5,40 +5,25 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-#include <cstdlib>
-#include <filesystem>
-#include <fstream>
-#include <sstream>
 #include <stdexcept>
 #include <string>
 #include <vector>
 
+#include "tests/support/Files.h"
+
 namespace tavro {
 
-/// A folder of its own for one test, removed with everything in it.
-class TemporaryFolder {
- public:
-  TemporaryFolder() {
-    std::string name = (std::filesystem::temp_directory_path() / "tavro-XXXXXX").string();
-    if (mkdtemp(name.data()) == nullptr) {
-      throw std::runtime_error("no temporary folder");
-    }
-    path = name;
-  }
-  ~TemporaryFolder() { std::filesystem::remove_all(path); }
-  TemporaryFolder(const TemporaryFolder&) = delete;
-  TemporaryFolder& operator=(const TemporaryFolder&) = delete;
-
-  std::filesystem::path path;
-};
-
-inline std::string contentOf(const std::filesystem::path& file) {
-  std::stringstream content;
-  content << std::ifstream(file).rdbuf();
-  return content.str();
-}
-
 inline std::string narrelPath() { return std::string(TAVRO_BUILD) + "/bin/narrel"; }
+
+/// The arguments as a program is started with them.
+inline std::vector<char*> wordsOf(std::vector<std::string>& arguments) {
+  std::vector<char*> words;
+  for (std::string& argument : arguments) {
+    words.push_back(argument.data());
+  }
+  words.push_back(nullptr);
+  return words;
+}
 
 /// What a finished program left behind.
 struct Finished {
@@ -50,10 +35,9 @@ struct Finished {
 /// Runs narrel to its end with that standard input.
 inline Finished runNarrel(std::vector<std::string> arguments, const std::string& input = "") {
   const TemporaryFolder folder;
-  const std::string in = folder.path / "in";
-  const std::string out = folder.path / "out";
-  const std::string error = folder.path / "error";
-  std::ofstream(in) << input;
+  const std::string in = folder.file("in", input);
+  const std::string out = folder.path() + "/out";
+  const std::string error = folder.path() + "/error";
   posix_spawn_file_actions_t files;
   posix_spawn_file_actions_init(&files);
   constexpr mode_t mode = 0600;
@@ -61,11 +45,7 @@ inline Finished runNarrel(std::vector<std::string> arguments, const std::string&
   posix_spawn_file_actions_addopen(&files, STDOUT_FILENO, out.c_str(), O_CREAT | O_WRONLY, mode);
   posix_spawn_file_actions_addopen(&files, STDERR_FILENO, error.c_str(), O_CREAT | O_WRONLY, mode);
   arguments.insert(arguments.begin(), narrelPath());
-  std::vector<char*> words;
-  for (std::string& argument : arguments) {
-    words.push_back(argument.data());
-  }
-  words.push_back(nullptr);
+  const std::vector<char*> words = wordsOf(arguments);
   pid_t process = 0;
   const int failure = posix_spawn(&process, words.front(), &files, nullptr, words.data(), environ);
   posix_spawn_file_actions_destroy(&files);
