@@ -115,7 +115,8 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   const std::optional<std::wstring> expected = fuzz::expected(format->text(), arguments);
   const Ref<NSString> filled = fuzz::fill(&stringWithFormat, format, arguments);
   const Ref<NSString> grouped = fuzz::fill(&localizedStringWithFormat, format, arguments);
-  fuzz::require(bool(filled) == expected.has_value() && bool(grouped) == expected.has_value(),
+  fuzz::require(static_cast<bool>(filled) == expected.has_value() &&
+                    static_cast<bool>(grouped) == expected.has_value(),
                 "nil is filled in with nothing");
   if (expected) {
     fuzz::require(fuzz::wide(filled->text()) == *expected, "placeholders are filled in order",

@@ -35,8 +35,12 @@ std::size_t rounded(std::size_t size, std::align_val_t alignment) {
 
 }  // namespace
 
-// The array and the non-throwing forms call these.
+// The array forms call these, unless a sanitizer has its own.
 void* operator new(std::size_t size) { return counted(std::malloc(size == 0 ? 1 : size)); }
+void* operator new(std::size_t size, const std::nothrow_t& /*tag*/) noexcept {
+  void* const block = std::malloc(size == 0 ? 1 : size);
+  return block == nullptr ? nullptr : counted(block);
+}
 void* operator new(std::size_t size, std::align_val_t alignment) {
   return counted(std::aligned_alloc(static_cast<std::size_t>(alignment), rounded(size, alignment)));
 }
