@@ -60,7 +60,7 @@ void requireConsistent(const Workout& workout) {
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   using namespace tavro;
   static const TemporaryFolder temporary;
-  const std::string path = temporary.path / "activity";
+  const std::string path = temporary.path() + "/activity";
   fuzz::write(path, fuzz::textOf(data, size));
   try {
     fuzz::requireConsistent(readActivityFile(path));

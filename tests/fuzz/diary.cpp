@@ -145,7 +145,7 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     return true;
   }();
   static_cast<void>(isLoaded);
-  const std::string path = temporary.path / "diary.json";
+  const std::string path = temporary.path() + "/diary.json";
   const std::string_view input = fuzz::textOf(data, size);
   fuzz::write(path, fuzz::fileOf(input));
   try {

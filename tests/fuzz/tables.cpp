@@ -65,7 +65,7 @@ void requireConsistent(const StringTable& table, const std::string& folder) {
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   using namespace tavro;
   static const TemporaryFolder temporary;
-  static const std::string folder = temporary.path / "pl.lproj";  // a language of many plurals
+  static const std::string folder = temporary.path() + "/pl.lproj";  // a language of many plurals
   std::filesystem::create_directory(folder);
   const std::string_view input = fuzz::textOf(data, size);
   const std::size_t end = input.find(fuzz::kSeparator);
