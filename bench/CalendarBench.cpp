@@ -75,8 +75,8 @@ void readDays(const std::vector<id>& days, std::size_t expected) {
 
 /// The label, the value and the frame of days that were found before.
 std::function<void()> readYear() {
-  const auto days = daysIn(calendarOf(1));
-  return [days] { readDays(days, daysOf(1)); };
+  const auto months = calendarOf(1);
+  return [months, days = daysIn(months)] { readDays(days, daysOf(1)); };
 }
 
 /// The dates and the percentages of the same days.
@@ -95,7 +95,10 @@ Work buildingYears(std::int64_t years) {
   return {"calendar:" + std::to_string(years),
           [years] {
             calendarOf(1);
-            return [years] { readDays(daysIn(calendarOf(years)), daysOf(years)); };
+            return [years] {
+              const auto months = calendarOf(years);
+              readDays(daysIn(months), daysOf(years));
+            };
           },
           static_cast<double>(daysOf(years)), false};
 }

@@ -110,19 +110,21 @@ inline constexpr double kSecondsPerDay = 86400;
 inline double energyOfHour(int hour) { return hour * 7.3; }
 inline double amountOfBar(int bar) { return 312.25 + bar * 1.37; }
 
-/// The parts of a day: their spans, the last of them to the minute.
-inline void formatParts(IcuTexts& icu, int parts, const char16_t* skeleton) {
+/// The span of a part of the day, the last one to the minute.
+inline void formatPart(IcuTexts& icu, int part, int parts, const char16_t* skeleton) {
   const double length = kSecondsPerDay / parts;
-  for (int part = 0; part < parts; ++part) {
-    const bool isLast = part == parts - 1;
-    const double start = kMidnight + part * length;
-    icu.interval(isLast ? u"h:mma" : skeleton, start, start + length - (isLast ? 1 : 0));
+  const bool isLast = part == parts - 1;
+  const double start = kMidnight + part * length;
+  icu.interval(isLast ? u"h:mma" : skeleton, start, start + length - (isLast ? 1 : 0));
+}
+inline void formatHours(IcuTexts& icu) {
+  for (int hour = 0; hour < kHours; ++hour) {
+    formatPart(icu, hour, kHours, u"ha");
   }
 }
-inline void formatHours(IcuTexts& icu) { formatParts(icu, kHours, u"ha"); }
 inline void formatSlices(IcuTexts& icu) {
-  formatParts(icu, kSlices, u"hxa");
   for (int slice = 0; slice < kSlices; ++slice) {
+    formatPart(icu, slice, kSlices, u"hxa");
     float sum = 0;
     for (int hour = 3 * slice; hour < 3 * slice + 3; ++hour) {
       sum += static_cast<float>(energyOfHour(hour));

@@ -17,13 +17,21 @@ constexpr std::u16string_view kNewlines = u"\n\v\f\r\u0085\u2028\u2029";
 
 std::string NSString::utf8() const {
   std::string bytes;
-  borrowed(text_).toUTF8String(bytes);
+  borrowed(text()).toUTF8String(bytes);
   return bytes;
+}
+
+void NSString::initWithText(std::u16string_view text) {
+  length_ = text.size();
+  if (length_ > kShortLength) {
+    long_ = std::make_unique_for_overwrite<char16_t[]>(length_);
+  }
+  std::ranges::copy(text, long_ ? long_.get() : short_.data());
 }
 
 Ref<NSString> string(std::u16string_view text) {
   Ref<NSString> made = make<NSString>();
-  made->initWithText(std::u16string(text));
+  made->initWithText(text);
   return made;
 }
 

@@ -9,10 +9,15 @@ std::string nameOf(const Object* receiver, Name selector) {
          std::string(selector.text()) + "]";
 }
 
+// Made by a function of its own: when it is thrown, nothing is left for the unwinding to clean up.
+NSException unknownSelector(const Object* receiver, Name selector) {
+  return {kInvalidArgumentException, nameOf(receiver, selector) + ": unrecognized selector"};
+}
+
 }  // namespace
 
 void raiseUnknownSelector(const Object* receiver, Name selector) {
-  raise(kInvalidArgumentException, nameOf(receiver, selector) + ": unrecognized selector");
+  throw unknownSelector(receiver, selector);
 }
 
 void raiseWrongSignature(const Object* receiver, const Method& method, Signature called) {
