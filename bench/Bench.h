@@ -59,9 +59,7 @@ void runCounted(const std::vector<std::string>& names);
 int checkCounts(const std::string& recorded);
 int recordCounts(const std::string& recorded);
 
-/// Everything a program needs before the plug-in is used: settings as on the sample's day, and the
-/// bundle, opened and installed.
-void useSampleSettings();
+/// Opens the bundle and installs its categories.
 void loadPlugin();
 
 /// The place of a file below the build folder.

@@ -94,7 +94,7 @@ Json currentCounts() {
   Json counts;
   for (const std::string& name : kChecked) {
     require(samples.contains("count:" + name), "valgrind must count the instructions");
-    counts[name] = std::round(samples.at("count:" + name).front());
+    counts[name] = std::round(10 * samples.at("count:" + name).front()) / 10;
   }
   return counts;
 }
@@ -169,7 +169,7 @@ int checkCounts(const std::string& recorded) {
     const double now = counts.at(name);
     const double ratio = now / before;
     const bool isNear = std::abs(ratio - 1) <= kTolerance;
-    std::printf("%-12s %12.0f %12.0f %8.3f%s\n", name.c_str(), before, now, ratio,
+    std::printf("%-12s %12.1f %12.1f %8.3f%s\n", name.c_str(), before, now, ratio,
                 isNear ? "" : "  differs");
     isSame = isSame && isNear;
   }

@@ -251,12 +251,6 @@ void require(bool isRight, const char* what) {
   }
 }
 
-void useSampleSettings() {
-  Settings& settings = Settings::current();
-  settings.timeZone = "America/New_York";
-  settings.now = secondsFromIso("2026-03-11T15:20Z").value();
-}
-
 void loadPlugin() { letSummariesDescribeRings(loadAccessibilityBundle(built("AXTavro.axbundle"))); }
 
 std::string built(std::string_view path) { return TAVRO_BUILD "/" + std::string(path); }
@@ -266,7 +260,9 @@ std::string built(std::string_view path) { return TAVRO_BUILD "/" + std::string(
 int main(int count, char** arguments) {
   using namespace tavro::bench;
   const std::string command = count > 1 ? arguments[1] : "";
-  useSampleSettings();
+  tavro::Settings& settings = tavro::Settings::current();
+  settings.timeZone = "America/New_York";
+  settings.now = tavro::secondsFromIso("2026-03-11T15:20Z").value();
   if (command == "--check" || command == "--record") {
     require(count == 3, "the file of recorded counts is missing");
     return command == "--check" ? checkCounts(arguments[2]) : recordCounts(arguments[2]);

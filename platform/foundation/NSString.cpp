@@ -26,7 +26,7 @@ void NSString::initWithText(std::u16string_view text) {
   if (length_ > kShortLength) {
     long_ = std::make_unique_for_overwrite<char16_t[]>(length_);
   }
-  std::ranges::copy(text, long_ ? long_.get() : short_.data());
+  text.copy(long_ ? long_.get() : short_.data(), length_);
 }
 
 Ref<NSString> string(std::u16string_view text) {
