@@ -93,8 +93,8 @@ Ref<NSDateComponents> prolepticComponents(const NSDate& date, const icu::TimeZon
   UErrorCode status = U_ZERO_ERROR;
   zone.getOffset(moment, false, raw, saving, status);
   requireSuccess(status, "reading a time zone");
-  const sys_time local{milliseconds(static_cast<std::int64_t>(std::floor(moment))) +
-                       milliseconds(raw + saving)};
+  const sys_time<milliseconds> local{milliseconds(static_cast<std::int64_t>(std::floor(moment))) +
+                                     milliseconds(raw + saving)};
   const auto day = floor<days>(local);
   if (std::abs(day.time_since_epoch().count()) > kLastDay) {
     return nullptr;

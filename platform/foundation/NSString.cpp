@@ -35,7 +35,12 @@ Ref<NSString> string(std::u16string_view text) {
   return made;
 }
 
-Ref<NSString> string(std::string_view utf8) { return stringOf(unicode(utf8)); }
+Ref<NSString> string(std::string_view utf8) {
+  // Names and keys, of which hundreds are read when a bundle is opened, need no conversion.
+  const bool isAscii =
+      std::ranges::all_of(utf8, [](char c) { return static_cast<signed char>(c) >= 0; });
+  return isAscii ? string(std::u16string(utf8.begin(), utf8.end())) : stringOf(unicode(utf8));
+}
 
 Ref<NSString> stringOf(const icu::UnicodeString& text) { return string(viewOf(text)); }
 

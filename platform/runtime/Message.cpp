@@ -5,8 +5,8 @@ namespace {
 
 std::string nameOf(const Object* receiver, Name selector) {
   const Class* const isa = receiver->isa();
-  return std::string(isa->isMetaclass() ? "+[" : "-[") + std::string(isa->name().text()) + " " +
-         std::string(selector.text()) + "]";
+  std::string name(isa->isMetaclass() ? "+[" : "-[");
+  return name.append(isa->name().text()).append(" ").append(selector.text()).append("]");
 }
 
 // Made by a function of its own: when it is thrown, nothing is left for the unwinding to clean up.
