@@ -19,9 +19,13 @@ constexpr std::int64_t kMostYears = 100;
 constexpr double kMoveGoal = 9.5;
 constexpr double kExerciseGoal = 5.5;
 constexpr double kStandGoal = 12.5;
-double moveOf(std::int64_t day) { return static_cast<double>(day % 9); }
-double exerciseOf(std::int64_t day) { return static_cast<double>(day % 5); }
-double standOf(std::int64_t day) { return static_cast<double>(day % 13); }
+/// From 0 to `limit`, without it, before 1970 too.
+double cycle(std::int64_t day, std::int64_t limit) {
+  return static_cast<double>(((day % limit) + limit) % limit);
+}
+double moveOf(std::int64_t day) { return cycle(day, 9); }
+double exerciseOf(std::int64_t day) { return cycle(day, 5); }
+double standOf(std::int64_t day) { return cycle(day, 13); }
 
 std::int64_t firstDayOf(std::int64_t years) { return daysFromCivil(kLastYear - years + 1, 1, 1); }
 std::int64_t lastDay() { return daysFromCivil(kLastYear, 12, 31); }
