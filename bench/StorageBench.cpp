@@ -1,6 +1,6 @@
 #include <benchmark/benchmark.h>
 
-#include "bench/Ratios.h"
+#include "bench/Bench.h"
 #include "platform/accessibility/KeyAccess.h"
 
 namespace tavro::bench {

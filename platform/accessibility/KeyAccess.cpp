@@ -114,14 +114,19 @@ const Access& remember(Class* isa, const Access& access) {
   return *find(*isa->keyTable(), access.key);
 }
 
-const Access& accessFor(Class* isa, Name key) {
+/// Finds out how a key that was not asked for yet is read. Apart, so that reads stay short.
+[[gnu::noinline]] const Access& learn(Class* isa, Name key) {
+  const auto lock = lockClassTables();
+  return remember(isa, resolve(isa, key));
+}
+
+[[gnu::always_inline]] inline const Access& accessFor(Class* isa, Name key) {
   if (const KeyTable* const table = isa->keyTable()) [[likely]] {
     if (const Access* const known = find(*table, key.hash())) [[likely]] {
       return *known;
     }
   }
-  const auto lock = lockClassTables();
-  return remember(isa, resolve(isa, key));
+  return learn(isa, key);
 }
 
 template <class T>
@@ -131,35 +136,48 @@ T call(const Object* object, const Method& accessor) {
 }
 
 template <class T>
-T read(const Object* object, const Access& access) {
+[[gnu::always_inline]] inline T read(const Object* object, const Access& access) {
   return access.accessor != nullptr ? call<T>(object, *access.accessor)
                                     : *static_cast<const T*>(access.variable->address(object));
 }
 
-/// Boxes a primitive as people expect it: a number, or a geometry value.
-id box(const Object* object, const Access& access) {
-  const std::string_view type =
-      access.accessor != nullptr ? access.accessor->signature.encodings : access.variable->type;
+/// Reads a primitive into a number; NO for what is none.
+bool readNumber(const Object* object, const Access& access, NSNumber& into) {
   switch (access.kind) {
     case 'B':
-      return number(read<bool>(object, access));
+      into.number = read<bool>(object, access);
+      return true;
     case 'q':
-      return number(read<std::int64_t>(object, access));
+      into.number = read<std::int64_t>(object, access);
+      return true;
     case 'Q':
-      return number(read<std::uint64_t>(object, access));
+      into.number = read<std::uint64_t>(object, access);
+      return true;
     case 'i':
-      return number(std::int64_t{read<std::int32_t>(object, access)});
+      into.number = std::int64_t{read<std::int32_t>(object, access)};
+      return true;
     case 'f':
-      return number(double{read<float>(object, access)});
+      into.number = double{read<float>(object, access)};
+      return true;
     case 'd':
-      return number(read<double>(object, access));
-    case '#':
-      return id(read<Class*>(object, access));
-    case '{':
-      break;
+      into.number = read<double>(object, access);
+      return true;
     default:
-      return nullptr;
+      return false;
   }
+}
+
+/// Boxes a primitive as people expect it: a number, or a geometry value.
+[[gnu::noinline]] id box(const Object* object, const Access& access) {
+  if (access.kind == '#') {
+    return id(read<Class*>(object, access));
+  }
+  if (access.kind != '{') {
+    const auto boxed = make<NSNumber>();
+    return readNumber(object, access, *boxed) ? boxed : nullptr;
+  }
+  const std::string_view type =
+      access.accessor != nullptr ? access.accessor->signature.encodings : access.variable->type;
   if (type == Encoding<CGPoint>::text.view()) {
     return value(read<CGPoint>(object, access));
   }
@@ -177,11 +195,23 @@ id readValue(const Object* object, Name key) {
   return access.kind == 0 ? id() : box(object, access);
 }
 
-/// The number under a key as the method of a number would give it; zero for anything else.
+/// The number under a key as the method of a number would give it; zero for anything else. A
+/// primitive needs no box for it.
 template <class T>
 T numberForKey(const Object* object, Name key, T (NSNumber::*convert)() const) {
-  const auto found = as<NSNumber>(safeValueForKey(object, key));
-  return found ? (found.get()->*convert)() : T();
+  if (object == nullptr) {
+    return T();
+  }
+  try {
+    const Access& access = accessFor(object->isa(), key);
+    if (NSNumber unboxed; readNumber(object, access, unboxed)) {
+      return (unboxed.*convert)();
+    }
+    const auto found = access.kind == '@' ? as<NSNumber>(read<id>(object, access)) : nullptr;
+    return found ? (found.get()->*convert)() : T();
+  } catch (...) {
+    return T();
+  }
 }
 
 }  // namespace
@@ -248,10 +278,6 @@ void _accessibilitySetRetainedValue(Object* object, const id& value, Name key) {
   if (object != nullptr) {
     object->attachValue(key.hash(), value);
   }
-}
-
-id _accessibilityValueForKey(const Object* object, Name key) {
-  return object == nullptr ? id() : id(object->attachedValue(key.hash()));
 }
 
 id __UIAccessibilityGetAssociatedObject(const Object* object, AssociationKey key) {

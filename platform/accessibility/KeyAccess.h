@@ -71,7 +71,9 @@ void AXPerformSafeBlock(const Block& block) {
 inline constexpr Name kUIAccessibilityStorageKeyChildren = "kUIAccessibilityStorageKeyChildren";
 
 void _accessibilitySetRetainedValue(Object* object, const id& value, Name key);
-id _accessibilityValueForKey(const Object* object, Name key);
+inline id _accessibilityValueForKey(const Object* object, Name key) {
+  return object == nullptr ? id() : id(object->attachedValue(key.hash()));
+}
 
 /// The address of a static variable, one per stored attribute.
 using AssociationKey = const void*;

@@ -5,6 +5,7 @@
 
 #include "platform/accessibility/KeyAccess.h"
 #include "platform/accessibility/Traversal.h"
+#include "platform/foundation/TextBuffer.h"
 
 namespace tavro {
 namespace {
@@ -19,20 +20,20 @@ class Joiner {
     if (!text || text->length() == 0) {
       return;
     }
-    if (!joined_.empty()) {
+    if (!joined_.text().empty()) {
       joined_ += kSeparator;
     }
     if (const auto attributed = as<NSAttributedString>(part)) {
-      parts_.push_back({joined_.size(), attributed});
+      parts_.push_back({joined_.text().size(), attributed});
     }
     joined_ += text->text();
   }
 
   [[nodiscard]] id result() const {
-    if (joined_.empty()) {
+    if (joined_.text().empty()) {
       return nullptr;
     }
-    const Ref<NSString> text = string(joined_);
+    const Ref<NSString> text = string(joined_.text());
     if (parts_.empty()) {
       return text;
     }
@@ -51,7 +52,7 @@ class Joiner {
     std::size_t start;
     Ref<NSAttributedString> text;
   };
-  std::u16string joined_;
+  TextBuffer joined_;
   std::vector<Part> parts_;
 };
 
@@ -68,8 +69,7 @@ bool isInvisibleView(const id& object) {
 id __UIAXStringForVariables(std::initializer_list<id> parts) {
   Joiner joiner;
   for (const id& part : parts) {
-    const auto text = as<NSString>(part);
-    if (text && text->utf8() == kVariablesSentinel) {
+    if (const auto text = as<NSString>(part); text && text->text() == kVariablesSentinel) {
       break;
     }
     joiner.add(part);

@@ -12,7 +12,7 @@ namespace tavro {
 // carries each part's attributes over that part; else it is an `NSString`.
 
 /// Ends the list of a joiner's variables.
-inline constexpr std::string_view kVariablesSentinel = "__AXStringForVariablesSentinel";
+inline constexpr std::u16string_view kVariablesSentinel = u"__AXStringForVariablesSentinel";
 
 /// The parts in order. The list may end with the sentinel string.
 id __UIAXStringForVariables(std::initializer_list<id> parts);

@@ -14,7 +14,9 @@ const Registered baseClassOfAll =
 constexpr Name kOwnMethods[] = {"safeCategoryTargetClassName", "safeCategoryBaseClass",
                                 "_accessibilityPerformValidations:"};
 
-/// Grafts one method unless it would change what callers of the target pass or get.
+/// Grafts one method unless it would change what callers of the target pass or get, and proves that
+/// a message to the target would reach it. The target's dispatch table is built by its first
+/// message, of the same methods.
 GraftOutcome graft(Class* target, const Method& method, Class* category) {
   GraftOutcome outcome{std::string(method.selector.text()), target->isMetaclass(), false, {}};
   const Method* const existing = target->methodWithoutTable(method.selector);
@@ -27,6 +29,10 @@ GraftOutcome graft(Class* target, const Method& method, Class* category) {
   Method grafted = method;
   grafted.graftedFrom = category;
   target->setMethod(grafted);
+  outcome.intercepts = target->methodWithoutTable(method.selector)->graftedFrom == category;
+  if (!outcome.intercepts) {
+    outcome.reason = "a message to the target class does not reach the category";
+  }
   return outcome;
 }
 
@@ -89,13 +95,6 @@ InstallationOutcome installSafeCategory(Name name) {
   graftAll(target, category, category, outcome.methods);
   graftAll(target->isa(), category->isa(), category, outcome.methods);
   outcome.installed = true;
-  for (GraftOutcome& method : outcome.methods) {
-    Class* const receiver = method.isClassMethod ? target->isa() : target;
-    method.intercepts = interceptingCategory(receiver, Name::make(method.selector)) == category;
-    if (!method.intercepts && method.reason.empty()) {
-      method.reason = "a message to the target class does not reach the category";
-    }
-  }
   return outcome;
 }
 

@@ -34,26 +34,33 @@ icu::DateTimePatternGenerator& patternGenerator() {
   });
 }
 
+/// A format with a calendar to reckon in, where ICU alone would make one for every text.
+struct MomentFormat {
+  std::unique_ptr<icu::SimpleDateFormat> format;
+  std::unique_ptr<icu::Calendar> moment;
+};
+
 /// Gives a format the user's time zone.
-std::unique_ptr<icu::SimpleDateFormat> zoned(std::unique_ptr<icu::SimpleDateFormat> format) {
+std::unique_ptr<MomentFormat> zoned(std::unique_ptr<icu::SimpleDateFormat> format) {
   format->adoptTimeZone(icuTimeZone(Settings::current().timeZone).release());
-  return format;
+  std::unique_ptr<icu::Calendar> moment(format->getCalendar()->clone());
+  return std::unique_ptr<MomentFormat>(new MomentFormat{std::move(format), std::move(moment)});
 }
 
-std::unique_ptr<icu::SimpleDateFormat> makePatternFormat(const icu::UnicodeString& pattern) {
+std::unique_ptr<MomentFormat> makePatternFormat(const icu::UnicodeString& pattern) {
   UErrorCode status = U_ZERO_ERROR;
   auto format = std::make_unique<icu::SimpleDateFormat>(pattern, userLocale(), status);
   requireSuccess(status, "making a date format");
   return zoned(std::move(format));
 }
 
-const icu::SimpleDateFormat& patternFormat(std::string_view pattern) {
-  return icuCache<PatternKind, icu::SimpleDateFormat>().get(
+MomentFormat& patternFormat(std::string_view pattern) {
+  return icuCache<PatternKind, MomentFormat>().get(
       userKey(pattern), [&] { return makePatternFormat(unicode(pattern)); });
 }
 
-const icu::SimpleDateFormat& templateFormat(std::string_view skeleton) {
-  return icuCache<TemplateKind, icu::SimpleDateFormat>().get(userKey(skeleton), [&] {
+MomentFormat& templateFormat(std::string_view skeleton) {
+  return icuCache<TemplateKind, MomentFormat>().get(userKey(skeleton), [&] {
     // A month alone is named as one: some languages' pattern for it has the form it has in dates,
     // a genitive in Greek.
     if (skeleton.find_first_not_of('M') == std::string_view::npos) {
@@ -87,40 +94,51 @@ std::int64_t styleOption(NSDateFormatterStyle date, NSDateFormatterStyle time) {
 }
 
 /// The format of two styles, not both none.
-const icu::SimpleDateFormat& styleFormat(NSDateFormatterStyle date, NSDateFormatterStyle time) {
-  return icuCache<StyleKind, icu::SimpleDateFormat>().get(
-      userKey({}, styleOption(date, time)), [&] {
-        std::unique_ptr<icu::DateFormat> format(
-            icu::DateFormat::createDateTimeInstance(icuStyle(date), icuStyle(time), userLocale()));
-        if (dynamic_cast<icu::SimpleDateFormat*>(format.get()) == nullptr) {
-          requireSuccess(U_MISSING_RESOURCE_ERROR, "making a date format");
-        }
-        return zoned(std::unique_ptr<icu::SimpleDateFormat>(
-            static_cast<icu::SimpleDateFormat*>(format.release())));
-      });
+MomentFormat& styleFormat(NSDateFormatterStyle date, NSDateFormatterStyle time) {
+  return icuCache<StyleKind, MomentFormat>().get(userKey({}, styleOption(date, time)), [&] {
+    std::unique_ptr<icu::DateFormat> format(
+        icu::DateFormat::createDateTimeInstance(icuStyle(date), icuStyle(time), userLocale()));
+    if (dynamic_cast<icu::SimpleDateFormat*>(format.get()) == nullptr) {
+      requireSuccess(U_MISSING_RESOURCE_ERROR, "making a date format");
+    }
+    return zoned(std::unique_ptr<icu::SimpleDateFormat>(
+        static_cast<icu::SimpleDateFormat*>(format.release())));
+  });
 }
 
-std::unique_ptr<icu::DateIntervalFormat> makeIntervalFormat(const icu::UnicodeString& skeleton) {
+/// An interval format with the calendars in which the ends of its last span were reckoned: spans
+/// that follow each other share one.
+struct IntervalFormat {
+  std::unique_ptr<icu::DateIntervalFormat> format;
+  std::unique_ptr<icu::Calendar> start;
+  std::unique_ptr<icu::Calendar> end;
+};
+
+std::unique_ptr<IntervalFormat> makeIntervalFormat(const icu::UnicodeString& skeleton) {
   UErrorCode status = U_ZERO_ERROR;
   std::unique_ptr<icu::DateIntervalFormat> format(
       icu::DateIntervalFormat::createInstance(skeleton, userLocale(), status));
   requireSuccess(status, "making an interval format");
   format->adoptTimeZone(icuTimeZone(Settings::current().timeZone).release());
-  return format;
+  const icu::Calendar& calendar =
+      *static_cast<const icu::SimpleDateFormat&>(*format->getDateFormat()).getCalendar();
+  std::unique_ptr<icu::Calendar> start(calendar.clone());
+  std::unique_ptr<icu::Calendar> end(calendar.clone());
+  return std::unique_ptr<IntervalFormat>(
+      new IntervalFormat{std::move(format), std::move(start), std::move(end)});
 }
 
-const icu::DateIntervalFormat& intervalFormat(std::string_view skeleton) {
-  return icuCache<TemplateIntervalKind, icu::DateIntervalFormat>().get(
+IntervalFormat& intervalFormat(std::string_view skeleton) {
+  return icuCache<TemplateIntervalKind, IntervalFormat>().get(
       userKey(skeleton), [&] { return makeIntervalFormat(unicode(skeleton)); });
 }
 
-const icu::DateIntervalFormat& intervalFormat(NSDateFormatterStyle date,
-                                              NSDateFormatterStyle time) {
-  return icuCache<StyleIntervalKind, icu::DateIntervalFormat>().get(
+IntervalFormat& intervalFormat(NSDateFormatterStyle date, NSDateFormatterStyle time) {
+  return icuCache<StyleIntervalKind, IntervalFormat>().get(
       userKey({}, styleOption(date, time)), [&] {
         UErrorCode status = U_ZERO_ERROR;
         icu::UnicodeString pattern;
-        styleFormat(date, time).toPattern(pattern);
+        styleFormat(date, time).format->toPattern(pattern);
         const icu::UnicodeString skeleton =
             icu::DateTimePatternGenerator::staticGetSkeleton(pattern, status);
         requireSuccess(status, "reading a date pattern");
@@ -128,11 +146,32 @@ const icu::DateIntervalFormat& intervalFormat(NSDateFormatterStyle date,
       });
 }
 
-Ref<NSString> formatted(const icu::SimpleDateFormat& format, const NSDate& date) {
+Ref<NSString> formatted(const MomentFormat& format, const NSDate& date) {
   UErrorCode status = U_ZERO_ERROR;
   icu::UnicodeString text;
-  format.format(icuMilliseconds(date.seconds), text, nullptr, status);
+  icu::FieldPosition field;
+  format.moment->setTime(icuMilliseconds(date.seconds), status);
+  format.format->format(*format.moment, text, field);
   requireSuccess(status, "formatting a date");
+  return stringOf(text);
+}
+
+Ref<NSString> formatted(IntervalFormat& format, double start, double end) {
+  UErrorCode status = U_ZERO_ERROR;
+  if (format.end->getTime(status) == start) {
+    std::swap(format.start, format.end);
+  }
+  if (format.start->getTime(status) != start) {
+    format.start->setTime(start, status);
+  }
+  if (end != start) {
+    format.end->setTime(end, status);
+  }
+  icu::UnicodeString text;
+  icu::FieldPosition field;
+  format.format->format(*format.start, end == start ? *format.start : *format.end, text, field,
+                        status);
+  requireSuccess(status, "formatting a date interval");
   return stringOf(text);
 }
 
@@ -160,7 +199,8 @@ std::unique_ptr<icu::Calendar> unsetCalendar(const icu::SimpleDateFormat& format
   return calendar;
 }
 
-Ref<NSDate> parsed(const icu::SimpleDateFormat& format, const NSString& text) {
+Ref<NSDate> parsed(const MomentFormat& kept, const NSString& text) {
+  const icu::SimpleDateFormat& format = *kept.format;
   const icu::UnicodeString whole = borrowed(text.text());
   const std::unique_ptr<icu::Calendar> calendar = unsetCalendar(format);
   icu::ParsePosition position;
@@ -206,23 +246,18 @@ bool isTemplate(std::string_view format) {
 
 Ref<NSString> NSDateIntervalFormatter::stringFromDate(const Ref<NSDate>& start,
                                                       const Ref<NSDate>& end) const {
-  if (!start || !end) {
-    return nullptr;
-  }
+  return start && end ? stringFromMoments(start->seconds, end->seconds) : nullptr;
+}
+
+Ref<NSString> NSDateIntervalFormatter::stringFromMoments(double start, double end) const {
   const bool showsNothing = template_.empty() && dateStyle_ == NSDateFormatterStyle::none &&
                             timeStyle_ == NSDateFormatterStyle::none;
   if (showsNothing) {
     return string("");
   }
-  const icu::DateIntervalFormat& format =
-      template_.empty() ? intervalFormat(dateStyle_, timeStyle_) : intervalFormat(template_);
-  const icu::DateInterval interval(icuMilliseconds(start->seconds), icuMilliseconds(end->seconds));
-  UErrorCode status = U_ZERO_ERROR;
-  icu::UnicodeString text;
-  icu::FieldPosition field;
-  format.format(&interval, text, field, status);
-  requireSuccess(status, "formatting a date interval");
-  return stringOf(text);
+  return formatted(
+      template_.empty() ? intervalFormat(dateStyle_, timeStyle_) : intervalFormat(template_),
+      icuMilliseconds(start), icuMilliseconds(end));
 }
 
 Ref<NSString> NSDateIntervalFormatter::stringFromDateInterval(
@@ -233,8 +268,8 @@ Ref<NSString> NSDateIntervalFormatter::stringFromDateInterval(
 namespace {
 
 /// The format that a formatter's settings choose; nullptr when they show nothing.
-const icu::SimpleDateFormat* chosenFormat(std::string_view format, std::string_view skeleton,
-                                          NSDateFormatterStyle date, NSDateFormatterStyle time) {
+const MomentFormat* chosenFormat(std::string_view format, std::string_view skeleton,
+                                 NSDateFormatterStyle date, NSDateFormatterStyle time) {
   if (!format.empty()) {
     return &patternFormat(format);
   }
@@ -253,14 +288,12 @@ Ref<NSString> NSDateFormatter::stringFromDate(const Ref<NSDate>& date) const {
   if (!date) {
     return nullptr;
   }
-  const icu::SimpleDateFormat* const format =
-      chosenFormat(format_, template_, dateStyle_, timeStyle_);
+  const MomentFormat* const format = chosenFormat(format_, template_, dateStyle_, timeStyle_);
   return format == nullptr ? string("") : formatted(*format, *date);
 }
 
 Ref<NSDate> NSDateFormatter::dateFromString(const Ref<NSString>& text) const {
-  const icu::SimpleDateFormat* const format =
-      chosenFormat(format_, template_, dateStyle_, timeStyle_);
+  const MomentFormat* const format = chosenFormat(format_, template_, dateStyle_, timeStyle_);
   return text && format != nullptr ? parsed(*format, *text) : nullptr;
 }
 

@@ -30,6 +30,8 @@ class NSDateIntervalFormatter : public NSObject {
   /// nil when either date is nil; an empty text when both styles are none and there is no template.
   [[nodiscard]] Ref<NSString> stringFromDate(const Ref<NSDate>& start,
                                              const Ref<NSDate>& end) const;
+  /// The same for two moments, in seconds since 1970-01-01 00:00 UTC.
+  [[nodiscard]] Ref<NSString> stringFromMoments(double start, double end) const;
   /// nil for nil.
   [[nodiscard]] Ref<NSString> stringFromDateInterval(const Ref<NSDateInterval>& interval) const;
 

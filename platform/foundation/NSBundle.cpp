@@ -38,29 +38,45 @@ std::string bestLanguage(const std::vector<std::string>& languages) {
   return languages.empty() ? std::string() : languages.front();
 }
 
+/// The shortest tag of the settings' locale ("en" for "en_US"). A folder of that name differs from
+/// the locale in nothing, so the matcher would choose it; without the matcher, whose data takes
+/// half of the time to open a bundle.
+std::string shortestTag() {
+  UErrorCode status = U_ZERO_ERROR;
+  icu::Locale locale(icu::Locale(Settings::current().locale.c_str()).getBaseName());
+  locale.minimizeSubtags(status);
+  std::string tag = locale.toLanguageTag<std::string>(status);
+  return U_SUCCESS(status) ? tag : std::string();
+}
+
 }  // namespace
 
 Ref<NSBundle> NSBundle::bundleForClass(Class* isa) {
-  return isa == nullptr ? nullptr : bundleWithPath(std::string(isa->image()));
+  return isa == nullptr ? nullptr : bundleWithPath(isa->image());
 }
 
-Ref<NSBundle> NSBundle::bundleWithPath(const std::string& path) {
-  static auto* const bundles = new std::map<std::string, Ref<NSBundle>>;
-  Ref<NSBundle>& bundle = (*bundles)[path];
-  if (!bundle) {
-    bundle = make<NSBundle>();
-    bundle->path_ = path;
+Ref<NSBundle> NSBundle::bundleWithPath(std::string_view path) {
+  static auto* const bundles = new std::map<std::string, Ref<NSBundle>, std::less<>>;
+  auto found = bundles->find(path);
+  if (found == bundles->end()) {
+    found = bundles->emplace(path, make<NSBundle>()).first;
+    found->second->path_ = path;
   }
-  return bundle;
+  return found->second;
+}
+
+bool NSBundle::hasTable(std::string_view language, std::string_view table) const {
+  const std::filesystem::path folder = path_ + "/" + std::string(language) + kLanguageFolder.data();
+  std::error_code error;
+  return std::filesystem::exists(folder / (std::string(table) + ".strings"), error);
 }
 
 std::vector<std::string> NSBundle::languagesOfTable(std::string_view table) const {
-  const std::string file = std::string(table) + ".strings";
   std::vector<std::string> languages;
   std::error_code error;
   for (const auto& folder : std::filesystem::directory_iterator(path_, error)) {
     if (folder.path().extension() == kLanguageFolder &&
-        std::filesystem::exists(folder.path() / file, error)) {
+        hasTable(folder.path().stem().string(), table)) {
       languages.push_back(folder.path().stem().string());
     }
   }
@@ -72,7 +88,10 @@ const NSBundle::Choice& NSBundle::choiceForTable(std::string_view table) const {
   const std::string& locale = Settings::current().locale;
   auto choice = choices_.find(table);
   if (choice == choices_.end() || choice->second.locale != locale) {
-    Choice made{.locale = locale, .language = bestLanguage(languagesOfTable(table))};
+    Choice made{.locale = locale, .language = shortestTag()};
+    if (!hasTable(made.language, table)) {
+      made.language = bestLanguage(languagesOfTable(table));
+    }
     choice = choices_.insert_or_assign(std::string(table), std::move(made)).first;
   }
   return choice->second;
@@ -104,16 +123,23 @@ const StringTable& NSBundle::table(std::string_view name) {
   return found->second;
 }
 
-Ref<NSString> NSBundle::localizedStringForKey(const Ref<NSString>& key, const Ref<NSString>& value,
-                                              std::string_view table) {
+Ref<NSString> NSBundle::textForKey(std::string_view key, std::string_view table) {
   try {
     const StringTable& texts = this->table(table);
-    if (const auto found = texts.find(utf8(key)); key && found != texts.end()) {
+    if (const auto found = texts.find(key); found != texts.end()) {
       return found->second;
     }
   } catch (const std::exception&) {
     // A table that cannot be used is a missing one: the caller still gets something to say. The
     // fault itself is reported by whoever asks for the table.
+  }
+  return nullptr;
+}
+
+Ref<NSString> NSBundle::localizedStringForKey(const Ref<NSString>& key, const Ref<NSString>& value,
+                                              std::string_view table) {
+  if (const Ref<NSString> found = key ? textForKey(key->utf8(), table) : nullptr) {
+    return found;
   }
   return lengthOfText(value) > 0 ? value : key;
 }

@@ -39,7 +39,7 @@ class NSBundle : public NSObject {
   /// platform are in the main bundle, which has no path and no tables.
   static Ref<NSBundle> bundleForClass(Class* isa);
   /// The one bundle object for a folder.
-  static Ref<NSBundle> bundleWithPath(const std::string& path);
+  static Ref<NSBundle> bundleWithPath(std::string_view path);
 
   [[nodiscard]] const std::string& path() const { return path_; }
   /// The languages for which the bundle has a table of that name, sorted.
@@ -50,6 +50,8 @@ class NSBundle : public NSObject {
   [[nodiscard]] std::string languageForTable(std::string_view table) const;
   /// Reads the table in the user's language unless it was read before. Throws a `FileError`.
   const StringTable& table(std::string_view name);
+  /// The text for the key; nil for a missing key or table. Never raises.
+  Ref<NSString> textForKey(std::string_view key, std::string_view table);
   /// The text for the key; for a missing key or table the value, or the key itself when the value
   /// is nil or empty. Never raises.
   Ref<NSString> localizedStringForKey(const Ref<NSString>& key, const Ref<NSString>& value,
@@ -63,6 +65,7 @@ class NSBundle : public NSObject {
     mutable const StringTable* texts = nullptr;
   };
   const Choice& choiceForTable(std::string_view table) const;
+  [[nodiscard]] bool hasTable(std::string_view language, std::string_view table) const;
 
   std::string path_;
   mutable std::map<std::string, Choice, std::less<>> choices_;  // by table

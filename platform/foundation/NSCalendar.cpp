@@ -1,6 +1,9 @@
 #include <unicode/gregocal.h>
 
 #include <algorithm>
+#include <chrono>
+#include <cmath>
+#include <cstdlib>
 
 #include "platform/foundation/IcuSupport.h"
 #include "platform/foundation/NSDate.h"
@@ -79,11 +82,48 @@ Ref<NSDate> momentOf(const icu::Calendar& calendar) {
   return dateWithSeconds(milliseconds / 1000);
 }
 
+/// The date in the proleptic Gregorian calendar, for which the standard library does. Nothing for
+/// the years that it does not count, some 32,000 to either side.
+Ref<NSDateComponents> prolepticComponents(const NSDate& date, const icu::TimeZone& zone) {
+  using namespace std::chrono;
+  constexpr std::int64_t kLastDay = 11'000'000;
+  const double moment = icuMilliseconds(date.seconds);
+  std::int32_t raw = 0;
+  std::int32_t saving = 0;
+  UErrorCode status = U_ZERO_ERROR;
+  zone.getOffset(moment, false, raw, saving, status);
+  requireSuccess(status, "reading a time zone");
+  const sys_time<milliseconds> local{milliseconds(static_cast<std::int64_t>(std::floor(moment))) +
+                                     milliseconds(raw + saving)};
+  const auto day = floor<days>(local);
+  if (std::abs(day.time_since_epoch().count()) > kLastDay) {
+    return nullptr;
+  }
+  const year_month_day civil(day);
+  const hh_mm_ss time(local - day);
+  const auto year = std::int64_t{int{civil.year()}};
+  Ref<NSDateComponents> components = make<NSDateComponents>();
+  components->era = year > 0 ? 1 : 0;
+  components->year = year > 0 ? year : 1 - year;
+  components->month = unsigned{civil.month()};
+  components->day = unsigned{civil.day()};
+  components->hour = time.hours().count();
+  components->minute = time.minutes().count();
+  components->second = time.seconds().count();
+  components->weekday = weekday(day).c_encoding() + 1;
+  return components;
+}
+
 }  // namespace
 
 Ref<NSDateComponents> NSCalendar::componentsFromDate(const Ref<NSDate>& date) const {
   if (!date) {
     return nullptr;
+  }
+  if (identifier == NSCalendarIdentifierGregorian) {
+    if (auto components = prolepticComponents(*date, icuCalendar(*this).getTimeZone())) {
+      return components;
+    }
   }
   const icu::Calendar& moment = calendarAt(*this, *date);
   Ref<NSDateComponents> components = make<NSDateComponents>();

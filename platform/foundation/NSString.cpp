@@ -17,17 +17,30 @@ constexpr std::u16string_view kNewlines = u"\n\v\f\r\u0085\u2028\u2029";
 
 std::string NSString::utf8() const {
   std::string bytes;
-  borrowed(text_).toUTF8String(bytes);
+  borrowed(text()).toUTF8String(bytes);
   return bytes;
+}
+
+void NSString::initWithText(std::u16string_view text) {
+  length_ = text.size();
+  if (length_ > kShortLength) {
+    long_ = std::make_unique_for_overwrite<char16_t[]>(length_);
+  }
+  text.copy(long_ ? long_.get() : short_.data(), length_);
 }
 
 Ref<NSString> string(std::u16string_view text) {
   Ref<NSString> made = make<NSString>();
-  made->initWithText(std::u16string(text));
+  made->initWithText(text);
   return made;
 }
 
-Ref<NSString> string(std::string_view utf8) { return stringOf(unicode(utf8)); }
+Ref<NSString> string(std::string_view utf8) {
+  // Names and keys, of which hundreds are read when a bundle is opened, need no conversion.
+  const bool isAscii =
+      std::ranges::all_of(utf8, [](char c) { return static_cast<signed char>(c) >= 0; });
+  return isAscii ? string(std::u16string(utf8.begin(), utf8.end())) : stringOf(unicode(utf8));
+}
 
 Ref<NSString> stringOf(const icu::UnicodeString& text) { return string(viewOf(text)); }
 

@@ -1,7 +1,9 @@
 #pragma once
 
+#include <array>
 #include <cstdint>
 #include <initializer_list>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -25,16 +27,23 @@ class NSString : public NSObject {
  public:
   static constexpr Name className = "NSString";
 
-  [[nodiscard]] std::size_t length() const { return text_.size(); }
-  [[nodiscard]] std::u16string_view text() const { return text_; }
+  [[nodiscard]] std::size_t length() const { return length_; }
+  [[nodiscard]] std::u16string_view text() const {
+    return {long_ ? long_.get() : short_.data(), length_};
+  }
   /// A surrogate without its partner becomes U+FFFD.
   [[nodiscard]] std::string utf8() const;
 
-  /// Set once, right after allocation.
-  void initWithText(std::u16string text) { text_ = std::move(text); }
+  /// Set once, right after allocation. The text is copied.
+  void initWithText(std::u16string_view text);
 
  private:
-  std::u16string text_;
+  // Most of what is said is no longer than this, and takes one allocation so.
+  static constexpr std::size_t kShortLength = 32;
+
+  std::size_t length_ = 0;
+  std::unique_ptr<char16_t[]> long_;
+  std::array<char16_t, kShortLength> short_;
 };
 
 /// A localized format that has one text for each plural category; as a plain string it is the text

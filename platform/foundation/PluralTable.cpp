@@ -116,7 +116,7 @@ class PluralReader {
     const Entry& other = require(parts, "other", variable);
     Ref<NSPluralFormat> format = make<NSPluralFormat>();
     format->language = language_;
-    format->initWithText(std::u16string(string(textOf(other))->text()));
+    format->initWithText(string(textOf(other))->text());
     for (const Entry& part : parts) {
       if (part.key == kRuleKey || part.key == kTypeKey) {
         continue;

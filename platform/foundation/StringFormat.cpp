@@ -3,6 +3,7 @@
 
 #include "platform/foundation/IcuSupport.h"
 #include "platform/foundation/NSString.h"
+#include "platform/foundation/TextBuffer.h"
 
 namespace tavro {
 namespace {
@@ -69,17 +70,17 @@ class Filler {
   Filler(std::span<const FormatArgument> arguments, bool isLocalized)
       : arguments_(arguments), isLocalized_(isLocalized) {}
 
-  std::u16string fill(std::u16string_view format) {
+  Ref<NSString> fill(std::u16string_view format) {
     while (true) {
       const std::size_t percent = format.find(u'%');
-      filled_.append(format.substr(0, percent));
+      filled_ += format.substr(0, percent);
       if (percent == std::u16string_view::npos) {
-        return std::move(filled_);
+        return string(filled_.text());
       }
       format.remove_prefix(percent + 1);
       Placeholder placeholder;
       if (!readPlaceholder(format, placeholder)) {
-        filled_.push_back(u'%');
+        filled_ += u"%";
         continue;
       }
       format.remove_prefix(placeholder.length);
@@ -90,7 +91,7 @@ class Filler {
  private:
   void append(const Placeholder& placeholder) {
     if (placeholder.kind == PlaceholderKind::percent) {
-      filled_.push_back(u'%');
+      filled_ += u"%";
       return;
     }
     const std::size_t position = placeholder.isPositional ? placeholder.position : ++used_;
@@ -109,11 +110,11 @@ class Filler {
 
   void appendInteger(std::int64_t integer) {
     if (isLocalized_) {
-      filled_.append(viewOf(groupedInteger(integer)));
+      filled_ += viewOf(groupedInteger(integer));
       return;
     }
     const std::string digits = std::to_string(integer);
-    filled_.append(digits.begin(), digits.end());
+    filled_ += std::u16string(digits.begin(), digits.end());
   }
 
   void appendObject(const id& object) {
@@ -122,14 +123,14 @@ class Filler {
       text = as<NSString>(trySend<id>(object, "description"));
     }
     if (text) {
-      filled_.append(text->text());
+      filled_ += text->text();
     }
   }
 
   std::span<const FormatArgument> arguments_;
   bool isLocalized_;
   std::size_t used_ = 0;
-  std::u16string filled_;
+  TextBuffer filled_;
 };
 
 /// The text of a plural format that fits the arguments; of another string its text.
@@ -163,9 +164,7 @@ Ref<NSString> filled(const Ref<NSString>& format, std::span<const FormatArgument
   if (!format || lacksOne) {
     return nullptr;
   }
-  Ref<NSString> text = make<NSString>();
-  text->initWithText(Filler(arguments, isLocalized).fill(formatText(format, arguments)));
-  return text;
+  return Filler(arguments, isLocalized).fill(formatText(format, arguments));
 }
 
 }  // namespace

@@ -137,6 +137,9 @@ Ref<HKUnit> HKUnit::unitDividedByUnit(const Ref<HKUnit>& divisor) const {
 }
 
 Ref<NSString> HKUnit::unitString() const {
+  if (unitString_) {
+    return unitString_;
+  }
   std::string numerator;
   std::string denominator;
   for (const auto& [symbol, power] : factors_) {
@@ -145,7 +148,8 @@ Ref<NSString> HKUnit::unitString() const {
   if (numerator.empty()) {
     numerator = "1";
   }
-  return string(denominator.empty() ? numerator : numerator + "/" + denominator);
+  unitString_ = string(denominator.empty() ? numerator : numerator + "/" + denominator);
+  return unitString_;
 }
 
 }  // namespace tavro

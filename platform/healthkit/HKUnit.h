@@ -73,6 +73,7 @@ class HKUnit : public NSObject {
   std::vector<Factor> factors_;
   HKDimension dimension_{};
   double scale_ = 1;
+  mutable Ref<NSString> unitString_;  // made when it is first asked for
 };
 
 }  // namespace tavro

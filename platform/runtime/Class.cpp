@@ -5,6 +5,7 @@
 #include <memory>
 #include <mutex>
 #include <ranges>
+#include <unordered_map>
 
 namespace tavro {
 namespace {
@@ -228,6 +229,7 @@ class ClassRegistry {
   void forget(Name name) {
     const std::lock_guard lock(runtimeMutex());
     std::erase_if(classes_, [&](const Class* each) { return each->name() == name; });
+    byName_.erase(name.hash());
     forgotten_.push_back(name);
     publish();
   }
@@ -272,9 +274,8 @@ class ClassRegistry {
   }
 
   Class* find(Name name) {
-    const auto found =
-        std::ranges::find_if(classes_, [&](const Class* each) { return each->name() == name; });
-    return found == classes_.end() ? nullptr : *found;
+    const auto found = byName_.find(name.hash());
+    return found == byName_.end() ? nullptr : found->second;
   }
 
   void make(const ClassDeclaration& declaration) {
@@ -293,6 +294,7 @@ class ClassRegistry {
       isa->retain();
       meta->retain();
       classes_.push_back(isa);
+      byName_.emplace(isa->name().hash(), isa);
     }
     for (const InstanceVariable& variable : declaration.variables) {
       isa->setVariable(variable);
@@ -344,7 +346,8 @@ class ClassRegistry {
   }
 
   std::vector<ClassDeclaration> pending_;
-  std::vector<Class*> classes_;
+  std::vector<Class*> classes_;  // in the order of their declaration
+  std::unordered_map<std::uint64_t, Class*> byName_;
   std::vector<Name> forgotten_;
   std::vector<RegistrationProblem> problems_;
   std::vector<std::unique_ptr<DirectoryTable>> directories_;

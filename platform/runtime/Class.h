@@ -221,5 +221,13 @@ template <class T>
 Ref<T> as(const id& object) {
   return isA<T>(object.get()) ? Ref<T>(static_cast<T*>(object.get())) : Ref<T>();
 }
+template <class T>
+Ref<T> as(id&& object) {
+  Ref<T> result;
+  if (isA<T>(object.get())) {
+    result.swap(object);
+  }
+  return result;
+}
 
 }  // namespace tavro

@@ -3,7 +3,10 @@
 namespace tavro {
 
 NSException::NSException(std::string_view name, std::string_view reason)
-    : name_(name), reason_(reason), text_(name_ + ": " + reason_) {}
+    : name_(name), reason_(reason) {
+  text_.reserve(name.size() + reason.size() + 2);
+  text_.append(name).append(": ").append(reason);
+}
 
 NSException::~NSException() = default;
 

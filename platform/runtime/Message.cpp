@@ -5,14 +5,19 @@ namespace {
 
 std::string nameOf(const Object* receiver, Name selector) {
   const Class* const isa = receiver->isa();
-  return std::string(isa->isMetaclass() ? "+[" : "-[") + std::string(isa->name().text()) + " " +
-         std::string(selector.text()) + "]";
+  std::string name(isa->isMetaclass() ? "+[" : "-[");
+  return name.append(isa->name().text()).append(" ").append(selector.text()).append("]");
+}
+
+// Made by a function of its own: when it is thrown, nothing is left for the unwinding to clean up.
+NSException unknownSelector(const Object* receiver, Name selector) {
+  return {kInvalidArgumentException, nameOf(receiver, selector) + ": unrecognized selector"};
 }
 
 }  // namespace
 
 void raiseUnknownSelector(const Object* receiver, Name selector) {
-  raise(kInvalidArgumentException, nameOf(receiver, selector) + ": unrecognized selector");
+  throw unknownSelector(receiver, selector);
 }
 
 void raiseWrongSignature(const Object* receiver, const Method& method, Signature called) {

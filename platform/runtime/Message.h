@@ -286,7 +286,8 @@ struct Registered {
 /// A new object of a native type, not yet initialised by any `init` method.
 template <class T>
 Ref<T> make() {
-  return Ref<T>(static_cast<T*>(classOf<T>()->allocate()));
+  static Class* const isa = classOf<T>();  // a class is its name's for the life of the process
+  return Ref<T>(static_cast<T*>(isa->allocate()));
 }
 
 }  // namespace tavro

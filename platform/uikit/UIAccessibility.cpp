@@ -21,28 +21,45 @@ AccessibilityAttributes& accessibilityAttributes(NSObject& object) {
 
 namespace {
 
-AccessibilityAttributes::Blocks& blocksOf(NSObject& object) {
-  auto& blocks = accessibilityAttributes(object).blocks;
-  if (!blocks) {
-    blocks = std::make_unique<AccessibilityAttributes::Blocks>();
+using Attributes = AccessibilityAttributes;
+using Rare = AccessibilityAttributes::Rare;
+using Traits = UIAccessibilityTraits;
+
+Rare& rareOf(NSObject& object) {
+  auto& rare = accessibilityAttributes(object).rare;
+  if (!rare) {
+    rare = std::make_unique<Rare>();
   }
-  return *blocks;
+  return *rare;
+}
+
+/// What was set of the rare kind, else its zero value.
+template <auto Member>
+auto storedRare(NSObject* self) {
+  using Value = std::remove_cvref_t<decltype(std::declval<Rare>().*Member)>;
+  return self->accessibility && self->accessibility->rare ? (*self->accessibility->rare).*Member
+                                                          : Value();
+}
+
+template <auto Member, class Value>
+void storeRare(NSObject* self, Value value) {
+  rareOf(*self).*Member = std::move(value);
 }
 
 /// The block of that kind, or nullptr when none is set.
 template <class Block>
-const Block* blockOf(const NSObject& self, Block AccessibilityAttributes::Blocks::*kind) {
-  if (!self.accessibility || !self.accessibility->blocks) {
+const Block* blockOf(const NSObject& self, Block Rare::*kind) {
+  if (!self.accessibility || !self.accessibility->rare) {
     return nullptr;
   }
-  const Block& block = (*self.accessibility->blocks).*kind;
+  const Block& block = (*self.accessibility->rare).*kind;
   return block ? &block : nullptr;
 }
 
 // The first two answers of each attribute; the third is the class's own.
 
 id label(NSObject* self) {
-  if (const LabelBlock* block = blockOf(*self, &AccessibilityAttributes::Blocks::label)) {
+  if (const LabelBlock* block = blockOf(*self, &Rare::label)) {
     return LabelBlock(*block)();
   }
   if (self->accessibility && self->accessibility->label) {
@@ -52,7 +69,7 @@ id label(NSObject* self) {
 }
 
 id valueOf(NSObject* self) {
-  if (const LabelBlock* block = blockOf(*self, &AccessibilityAttributes::Blocks::value)) {
+  if (const LabelBlock* block = blockOf(*self, &Rare::value)) {
     return LabelBlock(*block)();
   }
   if (self->accessibility && self->accessibility->value) {
@@ -62,7 +79,7 @@ id valueOf(NSObject* self) {
 }
 
 bool isElement(NSObject* self) {
-  if (const FlagBlock* block = blockOf(*self, &AccessibilityAttributes::Blocks::isElement)) {
+  if (const FlagBlock* block = blockOf(*self, &Rare::isElement)) {
     return FlagBlock(*block)();
   }
   if (self->accessibility && self->accessibility->isElement.has_value()) {
@@ -72,7 +89,7 @@ bool isElement(NSObject* self) {
 }
 
 bool activate(NSObject* self) {
-  if (const FlagBlock* block = blockOf(*self, &AccessibilityAttributes::Blocks::activate)) {
+  if (const FlagBlock* block = blockOf(*self, &Rare::activate)) {
     return FlagBlock(*block)();
   }
   return send<bool>(self, "_naturalAccessibilityActivate");
@@ -106,24 +123,23 @@ id ancestorOfKind(NSObject* self, Class* isa) {
 }
 
 CGRect frame(NSObject* self) {
-  if (self->accessibility && self->accessibility->frameInContainerSpace.has_value()) {
+  if (!self->accessibility || !self->accessibility->frame.has_value()) {
+    return send<CGRect>(self, "_naturalAccessibilityFrame");
+  }
+  const CGRect set = *self->accessibility->frame;
+  if (self->accessibility->frameIsInContainerSpace) {
     auto view = as<UIView>(trySend<id>(self, "accessibilityContainer"));
     if (!view) {
       view = as<UIView>(ancestorOfKind(self, classOf<UIView>()));
     }
-    return UIAccessibilityConvertFrameToScreenCoordinates(
-        *self->accessibility->frameInContainerSpace, view);
+    return UIAccessibilityConvertFrameToScreenCoordinates(set, view);
   }
-  if (self->accessibility && self->accessibility->frame.has_value()) {
-    return *self->accessibility->frame;
-  }
-  return send<CGRect>(self, "_naturalAccessibilityFrame");
+  return set;
 }
 
 CGPoint activationPoint(NSObject* self) {
-  return self->accessibility && self->accessibility->activationPoint.has_value()
-             ? *self->accessibility->activationPoint
-             : send<CGRect>(self, "accessibilityFrame").center();
+  const std::optional<CGPoint> set = storedRare<&Rare::activationPoint>(self);
+  return set ? *set : send<CGRect>(self, "accessibilityFrame").center();
 }
 
 id elements(NSObject* self) {
@@ -145,14 +161,11 @@ void store(NSObject* self, Value value) {
   accessibilityAttributes(*self).*Member = value;
 }
 
-template <auto Kind, class Block>
-void storeBlock(NSObject* self, Block block) {
-  blocksOf(*self).*Kind = std::move(block);
-}
-
+template <bool IsInContainerSpace>
 void setFrame(NSObject* self, CGRect rect) {
-  accessibilityAttributes(*self).frame = rect;
-  accessibilityAttributes(*self).frameInContainerSpace.reset();
+  Attributes& attributes = accessibilityAttributes(*self);
+  attributes.frame = rect;
+  attributes.frameIsInContainerSpace = IsInContainerSpace;
 }
 
 void setContainer(NSObject* self, id object) {
@@ -175,10 +188,6 @@ Answer nothing(NSObject* /*self*/) {
 bool alwaysVisible(NSObject* /*self*/) { return true; }
 id hitNothing(NSObject* self, CGPoint /*point*/, id /*event*/) { return self; }
 
-using Attributes = AccessibilityAttributes;
-using Blocks = AccessibilityAttributes::Blocks;
-using Traits = UIAccessibilityTraits;
-
 const Registered attributes =
     extendClass("NSObject")
         .method<&label>("accessibilityLabel")
@@ -194,12 +203,11 @@ const Registered attributes =
         .method<&store<&Attributes::traits, Traits>>("setAccessibilityTraits:")
         .method<&addTrait>("_accessibilityAddTrait:")
         .method<&frame>("accessibilityFrame")
-        .method<&setFrame>("setAccessibilityFrame:")
-        .method<&store<&Attributes::frameInContainerSpace, CGRect>>(
-            "setAccessibilityFrameInContainerSpace:")
+        .method<&setFrame<false>>("setAccessibilityFrame:")
+        .method<&setFrame<true>>("setAccessibilityFrameInContainerSpace:")
         .method<&nothing<id>>("accessibilityPath")
         .method<&activationPoint>("accessibilityActivationPoint")
-        .method<&store<&Attributes::activationPoint, CGPoint>>("setAccessibilityActivationPoint:")
+        .method<&storeRare<&Rare::activationPoint, CGPoint>>("setAccessibilityActivationPoint:")
         .method<&container>("accessibilityContainer")
         .method<&setContainer>("setAccessibilityContainer:")
         .method<&elements>("accessibilityElements")
@@ -208,8 +216,8 @@ const Registered attributes =
         .method<&store<&Attributes::elementsHidden, bool>>("setAccessibilityElementsHidden:")
         .method<&stored<&Attributes::viewIsModal>>("accessibilityViewIsModal")
         .method<&store<&Attributes::viewIsModal, bool>>("setAccessibilityViewIsModal:")
-        .method<&stored<&Attributes::identification>>("accessibilityIdentification")
-        .method<&store<&Attributes::identification, id>>("accessibilitySetIdentification:");
+        .method<&storedRare<&Rare::identification>>("accessibilityIdentification")
+        .method<&storeRare<&Rare::identification, id>>("accessibilitySetIdentification:");
 
 const Registered behaviour =
     extendClass("NSObject")
@@ -223,10 +231,10 @@ const Registered behaviour =
             "_accessibilitySetOverridesInvisibility:")
         .method<&store<&Attributes::viewIsVisible, bool>>("_accessibilitySetViewIsVisible:")
         .method<&alwaysVisible>("_accessibilityViewIsVisible")
-        .method<&storeBlock<&Blocks::label, LabelBlock>>("_setAccessibilityLabelBlock:")
-        .method<&storeBlock<&Blocks::value, LabelBlock>>("_setAccessibilityValueBlock:")
-        .method<&storeBlock<&Blocks::isElement, FlagBlock>>("_setIsAccessibilityElementBlock:")
-        .method<&storeBlock<&Blocks::activate, FlagBlock>>("_setAccessibilityActivateBlock:")
+        .method<&storeRare<&Rare::label, LabelBlock>>("_setAccessibilityLabelBlock:")
+        .method<&storeRare<&Rare::value, LabelBlock>>("_setAccessibilityValueBlock:")
+        .method<&storeRare<&Rare::isElement, FlagBlock>>("_setIsAccessibilityElementBlock:")
+        .method<&storeRare<&Rare::activate, FlagBlock>>("_setAccessibilityActivateBlock:")
         .method<&ancestorOfKind>("_accessibilityAncestorIsKindOf:")
         .method<&labelForKeys>("_accessibilityStringForLabelKeyValues:")
         .method<&nothing<bool>>("_naturalIsAccessibilityElement")

@@ -29,31 +29,32 @@ using LabelBlock = std::function<id()>;
 using FlagBlock = std::function<bool()>;
 
 /// What was set on an object for the screen reader. What was not set is answered by the class.
+/// Every element of a chart has one, so what few objects need is kept apart.
 struct AccessibilityAttributes {
-  struct Blocks {
+  struct Rare {
     LabelBlock label;
     LabelBlock value;
     FlagBlock isElement;
     FlagBlock activate;
+    id identification;
+    std::optional<CGPoint> activationPoint;  ///< screen coordinates
   };
 
   id label;
   id value;
   id hint;
-  id identification;
   Ref<NSArray> elements;
   Weak<> container;
+  std::unique_ptr<Rare> rare;
   std::optional<UIAccessibilityTraits> traits;
-  std::optional<CGRect> frame;                  ///< screen coordinates
-  std::optional<CGRect> frameInContainerSpace;  ///< the container view's coordinates
-  std::optional<CGPoint> activationPoint;       ///< screen coordinates
+  std::optional<CGRect> frame;  ///< screen coordinates, or those of the container's view
+  bool frameIsInContainerSpace = false;
   std::optional<bool> isElement;
   std::optional<bool> viewIsVisible;
   bool elementsHidden = false;
   bool overridesInvisibility = false;
   bool viewIsModal = false;
   bool informationLoaded = false;
-  std::unique_ptr<Blocks> blocks;
 };
 
 // Every object answers the accessibility attributes as messages. The answer is, in this order: what

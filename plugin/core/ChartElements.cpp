@@ -25,8 +25,8 @@ void addChartElement(NSMutableArray& elements, const Ref<UIView>& chart, const C
 Ref<NSString> spanOfDay(NSDateIntervalFormatter& formatter, std::string_view dateTemplate,
                         const Ref<NSDate>& startOfDay, double start, double length) {
   formatter.setDateTemplate(dateTemplate);
-  const Ref<NSDate> from = dateByAddingTimeInterval(startOfDay, start);
-  return formatter.stringFromDate(from, dateByAddingTimeInterval(from, length));
+  const double from = startOfDay->seconds + start;
+  return formatter.stringFromMoments(from, from + length);
 }
 
 void addDayParts(NSMutableArray& elements, const Ref<UIView>& chart, const DayParts& parts,

@@ -63,8 +63,6 @@ namespace tavro {
 bool _userIsWheelchairUserWithNarrelOn();
 
 /// `accessibilityLocalizedString` of a key that is written out.
-inline Ref<NSString> localized(std::string_view key) {
-  return accessibilityLocalizedString(string(key));
-}
+Ref<NSString> localized(std::string_view key);
 
 }  // namespace tavro

@@ -276,7 +276,7 @@ TEST_F(HeartRateTest, TheBlocksKeepNothingAliveAndAreEmptyOnceItIsGone) {
   auto row = makeView<Row>();
   send<void>(row, "_createAndConstraintNoDataOverlay");
   const Weak<UIView> overlay(row->_noDataOverlayView);
-  const auto& blocks = *accessibilityAttributes(*row->_noDataOverlayView).blocks;
+  const auto& blocks = *accessibilityAttributes(*row->_noDataOverlayView).rare;
   const FlagBlock isElement = blocks.isElement;
   const LabelBlock label = blocks.label;
   const FlagBlock activate = blocks.activate;
