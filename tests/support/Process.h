@@ -62,6 +62,7 @@ inline Finished runNarrel(std::vector<std::string> arguments, const std::string&
   posix_spawn_file_actions_addopen(&files, STDERR_FILENO, error.c_str(), O_CREAT | O_WRONLY, mode);
   arguments.insert(arguments.begin(), narrelPath());
   std::vector<char*> words;
+  words.reserve(arguments.size() + 1);
   for (std::string& argument : arguments) {
     words.push_back(argument.data());
   }
