@@ -127,6 +127,8 @@ class Class final : public Object {
   void removeMethod(Name selector);
 
   [[nodiscard]] const InstanceVariable* variable(Name name) const;
+  /// This class's own variables, in the order of their declaration.
+  [[nodiscard]] std::span<const InstanceVariable> ownVariables() const { return variables_; }
   /// Adds a variable or replaces the one of the same name.
   void setVariable(const InstanceVariable& variable);
   void removeVariable(Name name);

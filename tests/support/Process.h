@@ -18,6 +18,7 @@ inline std::string narrelPath() { return std::string(TAVRO_BUILD) + "/bin/narrel
 /// The arguments as a program is started with them.
 inline std::vector<char*> wordsOf(std::vector<std::string>& arguments) {
   std::vector<char*> words;
+  words.reserve(arguments.size() + 1);
   for (std::string& argument : arguments) {
     words.push_back(argument.data());
   }

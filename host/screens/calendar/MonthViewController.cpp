@@ -63,7 +63,9 @@ void MonthViewController::viewDidLoad() {
 
 void MonthViewController::setLoading(bool isLoading) {
   static_cast<void>(view());  // which makes the loading view
-  loadingView_->setHidden(!isLoading);
+  if (loadingView_) {
+    loadingView_->setHidden(!isLoading);
+  }
 }
 
 }  // namespace tavro
