@@ -1,6 +1,7 @@
 #include "platform/accessibility/Traversal.h"
 
 #include <algorithm>
+#include <ranges>
 #include <unordered_set>
 
 #include "platform/accessibility/Labels.h"
@@ -53,10 +54,9 @@ Children childrenOf(const id& object) {
     children.objects.assign(subviews.begin(), subviews.end());
   }
   // The frontmost modal view is the only one that is heard; subviews are listed back to front.
-  const auto& objects = children.objects;
-  for (auto child = objects.rbegin(); child != objects.rend(); ++child) {
-    if (trySend<bool>(*child, "accessibilityViewIsModal") && !isSilent(*child)) {
-      children.objects = {id(*child)};
+  for (const id& child : children.objects | std::views::reverse) {
+    if (trySend<bool>(child, "accessibilityViewIsModal") && !isSilent(child)) {
+      children.objects = std::vector{id(child)};
       return children;
     }
   }

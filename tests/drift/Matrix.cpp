@@ -20,7 +20,7 @@ using Json = nlohmann::json;
 constexpr std::size_t kDays = 14;
 
 /// The sample diary's last two weeks, as a file.
-std::string writeShortDiary(const std::filesystem::path& folder) {
+std::string shortDiary(const TemporaryFolder& folder) {
   Json diary = Json::parse(contentOf(TAVRO_SAMPLE_DIARY));
   Json& days = diary["days"];
   while (days.size() > kDays) {
@@ -29,9 +29,7 @@ std::string writeShortDiary(const std::filesystem::path& folder) {
   const std::string first = days.front()["date"];
   std::erase_if(diary["workouts"].get_ref<Json::array_t&>(),
                 [&](const Json& workout) { return workout["start"].get<std::string>() < first; });
-  const std::string path = folder / "diary.json";
-  std::ofstream(path) << diary;
-  return path;
+  return folder.file("diary.json", diary.dump());
 }
 
 /// What two weeks of objects became after a screen was shown again.
@@ -150,7 +148,7 @@ Matrix::Matrix() { prepare(); }
 void Matrix::prepare() {
   SessionOptions options;
   options.withPlugin = false;
-  options.diary = writeShortDiary(folder_.path);
+  options.diary = shortDiary(folder_);
   options.reader = std::string(TAVRO_SOURCE) + "/reader/resources";
   session_ = std::make_unique<Session>(options);
   bundle_ = std::make_unique<LoadedBundle>(
