@@ -1,7 +1,6 @@
 #include "platform/accessibility/Traversal.h"
 
 #include <algorithm>
-#include <ranges>
 #include <unordered_set>
 
 #include "platform/accessibility/Labels.h"
@@ -54,11 +53,13 @@ Children childrenOf(const id& object) {
     children.objects.assign(subviews.begin(), subviews.end());
   }
   // The frontmost modal view is the only one that is heard; subviews are listed back to front.
-  for (const id& child : children.objects | std::views::reverse) {
-    if (trySend<bool>(child, "accessibilityViewIsModal") && !isSilent(child)) {
-      children.objects = std::vector{id(child)};
-      return children;
-    }
+  const auto modal =
+      std::find_if(children.objects.rbegin(), children.objects.rend(), [](const id& child) {
+        return trySend<bool>(child, "accessibilityViewIsModal") && !isSilent(child);
+      });
+  if (modal != children.objects.rend()) {
+    children.objects = std::vector{id(*modal)};
+    return children;
   }
   if (!children.isElementList) {
     children.objects = sortedByGeometry(std::move(children.objects));
