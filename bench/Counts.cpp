@@ -102,7 +102,7 @@ Json currentCounts() {
 }  // namespace
 
 void sampleCounts(Samples& samples) {
-  samples["allocations: element"].push_back(std::floor(allocationsOfOne("elements")));
+  samples["allocations: element"].push_back(allocationsOfOne("elements"));
   // Eight elements with a label and a value each, and the list that holds them.
   samples["allocations: texts"].push_back(allocationsOfOne("slices") / 8 -
                                           samples["allocations: element"].front());

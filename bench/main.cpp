@@ -153,6 +153,7 @@ nlohmann::ordered_json asJson(const Spread& spread) {
 nlohmann::ordered_json reportRow(const Row& row, const Samples& samples) {
   for (const std::string_view name : {row.cost, row.bound, row.less}) {
     if (!name.empty() && !samples.contains(name)) {
+      std::printf("%-42s not measured\n", std::string(row.title).c_str());
       return nullptr;
     }
   }
@@ -166,9 +167,12 @@ nlohmann::ordered_json reportRow(const Row& row, const Samples& samples) {
   const bool isReached = row.reach == 0 || value <= row.reach;
   // Large figures are times in nanoseconds.
   const bool isLong = row.kind == Kind::figure && value >= 1e4;
-  std::printf("%-42s %8.*f %8s %s ", std::string(row.title).c_str(), isLong ? 0 : 2, value,
-              row.reach == 0 ? "-" : std::to_string(row.reach).substr(0, isLong ? 7 : 4).c_str(),
-              isReached ? " " : "!");
+  std::printf("%-42s %8.*f ", std::string(row.title).c_str(), isLong ? 0 : 2, value);
+  if (row.reach == 0) {
+    std::printf("%8s   ", "-");
+  } else {
+    std::printf("%8.*f %s ", row.reach >= 100 ? 0 : 2, row.reach, isReached ? " " : "!");
+  }
   printSpread(cost, row.unit);
   if (!row.bound.empty()) {
     std::printf(" / ");

@@ -14,9 +14,7 @@ const Registered baseClassOfAll =
 constexpr Name kOwnMethods[] = {"safeCategoryTargetClassName", "safeCategoryBaseClass",
                                 "_accessibilityPerformValidations:"};
 
-/// Grafts one method unless it would change what callers of the target pass or get, and proves that
-/// a message to the target would reach it. The target's dispatch table is built by its first
-/// message, of the same methods.
+/// Grafts one method unless it would change what callers of the target pass or get.
 GraftOutcome graft(Class* target, const Method& method, Class* category) {
   GraftOutcome outcome{std::string(method.selector.text()), target->isMetaclass(), false, {}};
   const Method* const existing = target->methodWithoutTable(method.selector);
@@ -29,10 +27,6 @@ GraftOutcome graft(Class* target, const Method& method, Class* category) {
   Method grafted = method;
   grafted.graftedFrom = category;
   target->setMethod(grafted);
-  outcome.intercepts = target->methodWithoutTable(method.selector)->graftedFrom == category;
-  if (!outcome.intercepts) {
-    outcome.reason = "a message to the target class does not reach the category";
-  }
   return outcome;
 }
 
@@ -96,6 +90,18 @@ InstallationOutcome installSafeCategory(Name name) {
   graftAll(target->isa(), category->isa(), category, outcome.methods);
   outcome.installed = true;
   return outcome;
+}
+
+void proveInterception(InstallationOutcome& installation) {
+  Class* const target = Class::named(Name::make(installation.target));
+  for (GraftOutcome& method : installation.methods) {
+    Class* const receiver = method.isClassMethod && target != nullptr ? target->isa() : target;
+    const Class* const reached = interceptingCategory(receiver, Name::make(method.selector));
+    method.intercepts = reached != nullptr && reached->name().text() == installation.category;
+    if (!method.intercepts && method.reason.empty()) {
+      method.reason = "a message to the target class does not reach the category";
+    }
+  }
 }
 
 }  // namespace tavro

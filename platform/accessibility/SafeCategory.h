@@ -69,8 +69,11 @@ ClassBuilder safeCategory() {
           "_accessibilityPerformValidations:");
 }
 
-/// Grafts a category onto its target class and proves each method; see `AXValidationManager`.
+/// Grafts a category onto its target class; see `AXValidationManager`.
 InstallationOutcome installSafeCategory(Name category);
+
+/// Looks up as a message would which category each grafted method's selector reaches, and notes it.
+void proveInterception(InstallationOutcome& installation);
 
 /// The category that a message with this selector to an instance of the class would reach first, or
 /// nullptr when it reaches the host's own method or nothing. For class methods give the metaclass.

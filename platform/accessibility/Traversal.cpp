@@ -1,7 +1,7 @@
 #include "platform/accessibility/Traversal.h"
 
 #include <algorithm>
-#include <unordered_set>
+#include <unordered_map>
 
 #include "platform/accessibility/Labels.h"
 #include "platform/foundation/Language.h"
@@ -15,20 +15,22 @@ class Visits {
  public:
   /// Whether the walk goes on into the object; `leave` follows.
   bool enter(const id& object) {
-    if (depth_ >= kDeepestNesting || !isFirst(object)) {
+    if (depth_ >= kDeepestNesting) {
       return false;
     }
+    isFirst(object);  // where the walk begins is met by it
     ++depth_;
     return true;
   }
   void leave() { --depth_; }
-  /// Whether the object was met for the first time.
-  bool isFirst(const id& object) { return seen_.insert(object.get()).second; }
+  /// Whether the object was met for the first time. It is kept until the walk ends: the address of
+  /// one that was made for the asking would soon be another's.
+  bool isFirst(const id& object) { return seen_.try_emplace(object.get(), object).second; }
 
  private:
   static constexpr std::size_t kDeepestNesting = 200;
   std::size_t depth_ = 0;
-  std::unordered_set<const Object*> seen_;
+  std::unordered_map<const Object*, id> seen_;
 };
 
 bool isSilent(const id& object) {
@@ -70,13 +72,11 @@ Children childrenOf(const id& object) {
 class ElementWalk {
  public:
   void visit(const id& object) {
-    if (!object || isSilent(object)) {
+    if (!object || isSilent(object) || !visits_.isFirst(object)) {
       return;
     }
     if (trySend<bool>(object, "isAccessibilityElement")) {
-      if (visits_.isFirst(object)) {
-        found.push_back({object, containers_});
-      }
+      found.push_back({object, containers_});
       return;
     }
     visitChildren(object);
@@ -127,7 +127,7 @@ class TextWalk {
 
  private:
   void visit(const id& object) {
-    if (!object || isExcluded(object) || isSilent(object)) {
+    if (!object || isExcluded(object) || isSilent(object) || !visits_.isFirst(object)) {
       return;
     }
     const bool isHeader = (trySend<UIAccessibilityTraits>(object, "accessibilityTraits") &

@@ -144,6 +144,10 @@ void AXValidationManager::performValidations(const ChecksHandler& checks,
   for (const Name category : installer->categories) {
     report_.installations.push_back(installSafeCategory(category));
   }
+  if (runsChecks) {
+    // After the last graft: the tables in which messages are looked up are built once.
+    std::ranges::for_each(report_.installations, proveInterception);
+  }
   if (after) {
     callHandler("postValidationHandler:", [&] { after(this); });
   }

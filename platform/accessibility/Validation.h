@@ -74,7 +74,7 @@ struct CheckOutcome {
 struct GraftOutcome {
   std::string selector;
   bool isClassMethod;
-  bool intercepts;  ///< a message to the target class reaches the category
+  bool intercepts;  ///< proven: a message to the target class reaches the category
   std::string reason;
 };
 

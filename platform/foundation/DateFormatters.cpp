@@ -149,9 +149,8 @@ IntervalFormat& intervalFormat(NSDateFormatterStyle date, NSDateFormatterStyle t
 Ref<NSString> formatted(const MomentFormat& format, const NSDate& date) {
   UErrorCode status = U_ZERO_ERROR;
   icu::UnicodeString text;
-  icu::FieldPosition field;
   format.moment->setTime(icuMilliseconds(date.seconds), status);
-  format.format->format(*format.moment, text, field);
+  format.format->format(*format.moment, text, nullptr, status);
   requireSuccess(status, "formatting a date");
   return stringOf(text);
 }

@@ -288,17 +288,21 @@ id UIAccessibilityAggregateElement::initWithContainerAndElements(const id& conta
 CGRect UIAccessibilityAggregateElement::naturalFrame() {
   // Elements may represent each other, and each other's: while the outermost is asked, each of them
   // is asked once.
-  thread_local std::unordered_map<const Object*, std::optional<CGRect>> asked;
-  const auto [known, isFirst] = asked.try_emplace(this);
-  if (!isFirst && !known->second) {
+  struct Asked {
+    id element;  // kept, so that its address stays its own
+    std::optional<CGRect> frame;
+  };
+  thread_local std::unordered_map<const Object*, Asked> asked;
+  const auto [known, isFirst] = asked.try_emplace(this, Asked{id(this), {}});
+  if (!isFirst && !known->second.frame) {
     raise(kInternalInconsistencyException, "an element represents itself");
   }
   if (!isFirst) {
-    return *known->second;
+    return *known->second.frame;
   }
   const bool isOutermost = asked.size() == 1;
   const CGRect frame = UIAXFrameForElements(representedElements);
-  asked[this] = frame;
+  asked[this].frame = frame;
   if (isOutermost) {
     asked.clear();
   }

@@ -32,18 +32,21 @@ void UITableView::appendRow(const Ref<UIView>& row, double height) {
 }
 
 bool UICellView::naturalIsElement() {
-  // Asked by a cell that decides about itself: a cell is neither label nor picture, so that what is
-  // inside makes no difference. It may be the same cell, by way of a list.
-  thread_local bool isDeciding = false;
-  if (isDeciding) {
-    return true;
-  }
   if (trySend<id>(this, "accessibilityElements")) {
     return false;
   }
-  isDeciding = true;
+  // Asked by a cell that decides about itself, and may be this one: it looks for labels and
+  // pictures, which this is not, so that it need not look inside. Else nested cells would multiply.
+  thread_local bool isDeciding = false;
+  if (isDeciding) {
+    return !subviewList().empty();
+  }
+  struct Deciding {
+    Deciding() { isDeciding = true; }
+    ~Deciding() { isDeciding = false; }
+  };
+  const Deciding deciding;
   const std::vector<id> inside = accessibleDescendants(this);
-  isDeciding = false;
   return !inside.empty() && std::ranges::all_of(inside, [](const id& element) {
     return isA<UILabel>(element.get()) || isA<UIImageView>(element.get());
   });

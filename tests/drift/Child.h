@@ -40,7 +40,14 @@ struct Child {
     Child child{fork(), ends[0]};
     if (child.process == 0) {
       alarm(kDeadline);
-      std::string text = work();
+      std::string text;
+      try {
+        text = work();
+      } catch (const std::exception& error) {
+        text = std::string("it raised: ") + error.what() + "\n";
+      } catch (...) {
+        text = "it raised\n";
+      }
       GlobalQueue::shared().drain();
 #if defined(__SANITIZE_ADDRESS__)
       text += __lsan_do_recoverable_leak_check() != 0 ? "memory leaks\n" : "";

@@ -445,6 +445,9 @@ Outcome Matrix::run(const std::vector<Case>& cases) const {
     summary << (kind == counts.begin()->first ? "" : ", ") << kind << " " << count;
   }
   outcome.summary = summary.str() + ")";
+  if (tried == 0) {
+    outcome.failures.push_back("no case is named so");
+  }
   return outcome;
 }
 

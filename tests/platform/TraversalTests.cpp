@@ -145,9 +145,24 @@ TEST(TraversalTests, NestingDoesNotMultiply) {
   }
   EXPECT_EQ(heard(lists), Heard{"leaf"});
   EXPECT_EQ(heard(cells), (Heard{"", "beside"}));
-  EXPECT_EQ(utf8(textForSubhierarchy(lists, true, true, nullptr)), "leaf, leaf");
+  EXPECT_EQ(utf8(textForSubhierarchy(lists, true, true, nullptr)), "leaf");
   EXPECT_EQ(trySend<CGRect>(aggregates, "accessibilityFrame"),
             trySend<CGRect>(leaf, "accessibilityFrame"));
+}
+
+TEST(TraversalTests, WhatIsMadeForTheAskingIsHeardWhereverItsAddressWas) {
+  // Each of the views lists a fresh group, which is gone once it was walked.
+  const auto root = group({});
+  for (int view = 0; view < 8; ++view) {
+    const auto asked = group({}, {0, 10.0 * view, 10, 10});
+    const auto label = makeLabel("heard");
+    answers<id>(asked, "accessibilityElements", [label, isEmpty = view % 2 == 0] {
+      const auto fresh = isEmpty ? group({}) : group({label});
+      return id(arrayWithObjects({fresh}));
+    });
+    root->addSubview(asked);
+  }
+  EXPECT_EQ(heard(root), (Heard{"heard", "heard", "heard", "heard"}));
 }
 
 TEST(TraversalTests, WhatHoldsItselfAnswers) {
@@ -206,6 +221,9 @@ TEST(TraversalTests, CellsOfLabelsAndPicturesAreOneElement) {
   EXPECT_EQ(heard(cell), (Heard{"title", "detail", "more"})) << "read apart beside a button";
   button->setHidden(true);
   EXPECT_EQ(heard(cell), Heard{"title, detail"});
+  const auto empty = makeView<UICollectionViewCell>();
+  cell->addSubview(empty);
+  EXPECT_EQ(heard(cell), Heard{"title, detail"}) << "an empty cell makes no difference";
   listing(cell, {cell->textLabel()});
   EXPECT_EQ(heard(cell), Heard{"title"}) << "a list of its own";
   const auto collectionCell = makeView<UICollectionViewCell>();
