@@ -62,6 +62,7 @@ decltype(auto) receive(TravelArgument<T> argument) {
   } else if constexpr (std::is_enum_v<Value>) {
     return static_cast<Value>(argument);
   } else {
+    // NOLINTNEXTLINE(bugprone-sizeof-expression): of pointers, whose size is right, too
     static_assert(!std::is_integral_v<Value> || sizeof(Value) == 8 || std::is_same_v<Value, bool>,
                   "integers travel as 64 bits; take one");
     return argument;
