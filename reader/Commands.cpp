@@ -131,11 +131,11 @@ int validateContract(const Command& command) {
 }
 
 CGPoint pointFromText(const std::string& text) {
-  const std::size_t comma = text.find(',');
-  const auto x = numberFrom<double>(std::string_view(text).substr(0, comma));
-  const auto y = comma == std::string::npos
-                     ? std::nullopt
-                     : numberFrom<double>(std::string_view(text).substr(comma + 1));
+  const std::string_view point = text;
+  const std::size_t comma = point.find(',');
+  const auto x = numberFrom<double>(point.substr(0, comma));
+  const auto y =
+      comma == std::string_view::npos ? std::nullopt : numberFrom<double>(point.substr(comma + 1));
   if (!x || !y || !std::isfinite(*x) || !std::isfinite(*y)) {
     refuse(inQuotes(text) + " is not a point such as 120,300");
   }
