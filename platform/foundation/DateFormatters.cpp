@@ -267,13 +267,10 @@ Ref<NSString> NSDateIntervalFormatter::stringFromDateInterval(
 namespace {
 
 /// The format that a formatter's settings choose; nullptr when they show nothing.
-const MomentFormat* chosenFormat(std::string_view format, std::string_view skeleton,
-                                 NSDateFormatterStyle date, NSDateFormatterStyle time) {
+const MomentFormat* chosenFormat(std::string_view format, NSDateFormatterStyle date,
+                                 NSDateFormatterStyle time) {
   if (!format.empty()) {
     return &patternFormat(format);
-  }
-  if (!skeleton.empty()) {
-    return &templateFormat(skeleton);
   }
   if (date == NSDateFormatterStyle::none && time == NSDateFormatterStyle::none) {
     return nullptr;
@@ -287,12 +284,12 @@ Ref<NSString> NSDateFormatter::stringFromDate(const Ref<NSDate>& date) const {
   if (!date) {
     return nullptr;
   }
-  const MomentFormat* const format = chosenFormat(format_, template_, dateStyle_, timeStyle_);
+  const MomentFormat* const format = chosenFormat(format_, dateStyle_, timeStyle_);
   return format == nullptr ? string("") : formatted(*format, *date);
 }
 
 Ref<NSDate> NSDateFormatter::dateFromString(const Ref<NSString>& text) const {
-  const MomentFormat* const format = chosenFormat(format_, template_, dateStyle_, timeStyle_);
+  const MomentFormat* const format = chosenFormat(format_, dateStyle_, timeStyle_);
   return text && format != nullptr ? parsed(*format, *text) : nullptr;
 }
 

@@ -45,16 +45,8 @@ class NSDateFormatter : public NSObject {
  public:
   static constexpr Name className = "NSDateFormatter";
 
-  /// A literal pattern. Takes the place of a template, and a template that of a pattern.
-  void setDateFormat(std::string_view format) {
-    format_ = format;
-    template_.clear();
-  }
-  /// Fields that the locale orders and separates, chosen anew at each use.
-  void setLocalizedDateFormatFromTemplate(std::string_view skeleton) {
-    template_ = skeleton;
-    format_.clear();
-  }
+  /// A literal pattern. Takes the place of the styles.
+  void setDateFormat(std::string_view format) { format_ = format; }
   void setDateStyle(NSDateFormatterStyle style) { dateStyle_ = style; }
   void setTimeStyle(NSDateFormatterStyle style) { timeStyle_ = style; }
 
@@ -72,7 +64,6 @@ class NSDateFormatter : public NSObject {
 
  private:
   std::string format_;
-  std::string template_;
   NSDateFormatterStyle dateStyle_ = NSDateFormatterStyle::none;
   NSDateFormatterStyle timeStyle_ = NSDateFormatterStyle::none;
 };

@@ -38,7 +38,6 @@ class NSMutableArray : public NSArray {
   void addObject(const id& object);
   /// Adds unless nil.
   void axSafelyAddObject(const id& object);
-  void removeAllObjects() { objects_.clear(); }
 };
 
 /// An array of those objects that are not nil, in their order.
